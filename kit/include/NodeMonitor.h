@@ -1,0 +1,28 @@
+#ifndef _NODE_MONITOR_H
+#define _NODE_MONITOR_H
+
+#include <SupportDefs.h>
+
+// Watch flags.
+enum {
+	B_STOP_WATCHING = 0x0000,
+	B_WATCH_NAME = 0x0001,
+	B_WATCH_STAT = 0x0002,
+	B_WATCH_ATTR = 0x0004,
+	B_WATCH_DIRECTORY = 0x0008,
+	B_WATCH_ALL = 0x000f,
+	B_WATCH_MOUNT = 0x0010
+};
+
+// The "opcode" of B_NODE_MONITOR messages.
+enum {
+	B_ENTRY_CREATED = 1,
+	B_ENTRY_REMOVED = 2,
+	B_ENTRY_MOVED = 3,
+	B_STAT_CHANGED = 4,
+	B_ATTR_CHANGED = 5,
+	B_DEVICE_MOUNTED = 6,
+	B_DEVICE_UNMOUNTED = 7
+};
+
+#endif
