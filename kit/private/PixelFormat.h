@@ -27,8 +27,8 @@ inline int32 BytesPerRowFor(color_space space, int32 width)
 	return (width * BytesPerPixel(space) + 3) & ~3;
 }
 
-// Transparent pixels read as B_TRANSPARENT_COLOR (alpha 0): the magic index,
-// the magic colour in B_RGB32, alpha below one half in B_RGBA32.
+// Transparent pixels read with alpha 0: the magic index and the magic colour
+// of B_RGB32 read as B_TRANSPARENT_COLOR; B_RGBA32 keeps its own alpha.
 inline rgb_color ReadPixel(const uint8* pixel, color_space space)
 {
 	if (space == B_CMAP8)
@@ -39,11 +39,12 @@ inline rgb_color ReadPixel(const uint8* pixel, color_space space)
 		if (color.red == B_TRANSPARENT_32_BIT.red && color.green == B_TRANSPARENT_32_BIT.green
 			&& color.blue == B_TRANSPARENT_32_BIT.blue)
 			return B_TRANSPARENT_32_BIT;
-	} else if (color.alpha < 128)
-		return B_TRANSPARENT_32_BIT;
+	}
 	return color;
 }
 
+// B_CMAP8 takes the transparent index for alpha below one half; B_RGB32
+// stores the colour alone.
 inline void WritePixel(uint8* pixel, color_space space, rgb_color color)
 {
 	if (space == B_CMAP8) {
