@@ -1,6 +1,7 @@
 #ifndef KIT_PRIVATE_TYPE_ICONS_H
 #define KIT_PRIVATE_TYPE_ICONS_H
 
+#include <functional>
 #include <map>
 #include <memory>
 #include <string>
@@ -52,10 +53,11 @@ public:
 	IconTheme(const IconTheme&) = delete;
 	IconTheme& operator=(const IconTheme&) = delete;
 
-	// The path of the first of names that a theme has as a size x size PNG,
-	// trying every name in a theme before the theme it inherits; empty when
-	// none has.
-	std::string Find(const std::vector<std::string>& names, int32 size);
+	// Offers load the PNGs of names in the folders of size x size icons,
+	// every name in a theme before the theme it inherits, until load gives
+	// an icon; null when it never did.
+	IconRef Find(const std::vector<std::string>& names, int32 size,
+		const std::function<IconRef(const std::string& path)>& load);
 
 private:
 	struct Theme {

@@ -48,15 +48,19 @@ private:
 	{
 		if (fTheme == nullptr)
 			fTheme = std::make_unique<IconTheme>();
-		std::string path = fTheme->Find(MimeIconNames(type), size);
-		if (path.empty())
-			return KitDrawnIcon(type, size);
-
-		auto known = fByFile.find(path);
-		IconRef icon = known != fByFile.end() ? known->second
-			: fByFile.emplace(path, DecodePngIcon(path.c_str(), size))
-				.first->second;
+		IconRef icon = fTheme->Find(MimeIconNames(type), size,
+			[&](const std::string& path) { return _Decoded(path, size); });
 		return icon != nullptr ? icon : KitDrawnIcon(type, size);
+	}
+
+	// A file that does not decode is remembered as such too.
+	IconRef _Decoded(const std::string& path, int32 size)
+	{
+		auto known = fByFile.find(path);
+		if (known != fByFile.end())
+			return known->second;
+		return fByFile.emplace(path, DecodePngIcon(path.c_str(), size))
+			.first->second;
 	}
 
 	std::mutex fLock;

@@ -63,6 +63,7 @@ KeyFile LoadIndex(const std::vector<std::string>& baseFolders,
 {
 	for (const std::string& folder : baseFolders) {
 		KeyFile index(g_key_file_new());
+		g_key_file_set_list_separator(index.get(), ',');
 		std::string path = folder + "/" + theme + "/index.theme";
 		if (g_key_file_load_from_file(index.get(), path.c_str(),
 				G_KEY_FILE_NONE, nullptr))
@@ -124,7 +125,8 @@ IconTheme::IconTheme()
 
 IconTheme::~IconTheme() = default;
 
-std::string IconTheme::Find(const std::vector<std::string>& names, int32 size)
+IconRef IconTheme::Find(const std::vector<std::string>& names, int32 size,
+	const std::function<IconRef(const std::string& path)>& load)
 {
 	for (const std::vector<std::string>& folders : _FoldersFor(size)) {
 		for (const std::string& name : names) {
@@ -132,12 +134,14 @@ std::string IconTheme::Find(const std::vector<std::string>& names, int32 size)
 				continue;
 			for (const std::string& folder : folders) {
 				std::string path = folder + "/" + name + ".png";
-				if (access(path.c_str(), R_OK) == 0)
-					return path;
+				if (access(path.c_str(), R_OK) != 0)
+					continue;
+				if (IconRef icon = load(path))
+					return icon;
 			}
 		}
 	}
-	return "";
+	return nullptr;
 }
 
 const IconTheme::FoldersPerTheme& IconTheme::_FoldersFor(int32 size)
