@@ -45,7 +45,7 @@ public:
 	BFile& operator=(const BFile& file);
 
 private:
-	status_t _CheckRegular();
+	status_t _CheckRegular(status_t status);
 
 	uint32 fMode;
 };

@@ -2,6 +2,7 @@
 #define _NODE_H
 
 #include <memory>
+#include <string>
 
 #include <Statable.h>
 #include <StorageDefs.h>
@@ -96,14 +97,14 @@ protected:
 	status_t _SetToEntry(const BEntry* entry, int openFlags);
 	status_t _SetToAt(const BDirectory* dir, const char* path, int openFlags);
 	int _FileDescriptor() const;
-	// The canonical path of the node when it was opened.
-	const char* _Path() const;
+	// Where the node is now, links resolved.
+	status_t _GetPath(std::string* path) const;
 	// The kit's id of the node's volume.
 	dev_t _Device() const;
 
 private:
 	virtual status_t _SetStat(const struct stat& st, uint32 what);
-	status_t _Adopt(int fd, const char* path);
+	status_t _Adopt(int fd);
 
 	std::unique_ptr<BPrivate::NodeData> fData;
 	status_t fCStatus;

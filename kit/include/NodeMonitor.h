@@ -14,6 +14,18 @@ enum {
 	B_WATCH_MOUNT = 0x0010
 };
 
+// The stat fields a change touches.
+enum {
+	B_STAT_MODE = 0x0001,
+	B_STAT_UID = 0x0002,
+	B_STAT_GID = 0x0004,
+	B_STAT_SIZE = 0x0008,
+	B_STAT_ACCESS_TIME = 0x0010,
+	B_STAT_MODIFICATION_TIME = 0x0020,
+	B_STAT_CREATION_TIME = 0x0040,
+	B_STAT_CHANGE_TIME = 0x0080
+};
+
 // The "opcode" of B_NODE_MONITOR messages.
 enum {
 	B_ENTRY_CREATED = 1,

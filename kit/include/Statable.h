@@ -35,16 +35,6 @@ public:
 	status_t SetAccessTime(time_t atime);
 	status_t GetVolume(BVolume* volume) const;
 
-protected:
-	// Which fields of the stat _SetStat applies.
-	enum {
-		B_STAT_MODE = 0x01,
-		B_STAT_UID = 0x02,
-		B_STAT_GID = 0x04,
-		B_STAT_MODIFICATION_TIME = 0x08,
-		B_STAT_ACCESS_TIME = 0x10
-	};
-
 private:
 	virtual status_t _SetStat(const struct stat& st, uint32 what) = 0;
 };

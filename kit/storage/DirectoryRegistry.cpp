@@ -1,0 +1,91 @@
+#include "DirectoryRegistry.h"
+
+#include <sys/stat.h>
+
+#include "VolumeTable.h"
+
+namespace BPrivate {
+
+namespace {
+
+bool IsAtOrBelow(const std::string& path, const std::string& folder)
+{
+	return path.compare(0, folder.size(), folder) == 0
+		&& (path.size() == folder.size() || path[folder.size()] == '/');
+}
+
+bool StillThere(const std::string& path, ino_t node, dev_t systemDevice)
+{
+	struct stat st;
+	return lstat(path.c_str(), &st) == 0 && S_ISDIR(st.st_mode)
+		&& st.st_ino == node && st.st_dev == systemDevice;
+}
+
+}
+
+DirectoryRegistry& DirectoryRegistry::Default()
+{
+	static DirectoryRegistry registry;
+	return registry;
+}
+
+void DirectoryRegistry::Register(dev_t device, ino_t node, dev_t systemDevice,
+	const std::string& path)
+{
+	std::lock_guard<std::mutex> locker(fLock);
+	fFolders[{ device, node }] = { path, systemDevice };
+}
+
+status_t DirectoryRegistry::Resolve(dev_t device, ino_t node,
+	std::string* path)
+{
+	Location location;
+	bool known = false;
+	{
+		std::lock_guard<std::mutex> locker(fLock);
+		auto found = fFolders.find({ device, node });
+		if (found != fFolders.end()) {
+			location = found->second;
+			known = true;
+		}
+	}
+	if (known) {
+		if (StillThere(location.path, node, location.systemDevice)) {
+			*path = location.path;
+			return B_OK;
+		}
+		std::lock_guard<std::mutex> locker(fLock);
+		auto found = fFolders.find({ device, node });
+		if (found != fFolders.end() && found->second.path == location.path)
+			fFolders.erase(found);
+	}
+	// Volume roots are known without having been seen.
+	VolumeEntry volume;
+	struct stat st;
+	if (VolumeTable::Default().Find(device, &volume) == B_OK
+		&& lstat(volume.root.c_str(), &st) == 0 && st.st_ino == node) {
+		Register(device, node, st.st_dev, volume.root);
+		*path = volume.root;
+		return B_OK;
+	}
+	return B_ENTRY_NOT_FOUND;
+}
+
+void DirectoryRegistry::Moved(const std::string& from, const std::string& to)
+{
+	std::lock_guard<std::mutex> locker(fLock);
+	for (auto& [key, location] : fFolders) {
+		if (IsAtOrBelow(location.path, from))
+			location.path = to + location.path.substr(from.size());
+	}
+}
+
+void DirectoryRegistry::Removed(const std::string& path)
+{
+	std::lock_guard<std::mutex> locker(fLock);
+	std::erase_if(fFolders, [&](const auto& item) {
+		return item.second.path == path;
+	});
+}
+
+}

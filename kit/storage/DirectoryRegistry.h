@@ -1,0 +1,41 @@
+#ifndef KIT_STORAGE_DIRECTORY_REGISTRY_H
+#define KIT_STORAGE_DIRECTORY_REGISTRY_H
+
+#include <map>
+#include <mutex>
+#include <string>
+
+#include <SupportDefs.h>
+
+namespace BPrivate {
+
+// Where the folders the kit has seen lie, by (volume id, node), so that an
+// entry_ref can be turned back into a path. A path is checked with lstat
+// each time it is used; the kit's own renames and moves of folders carry
+// the paths of the folders below along.
+class DirectoryRegistry {
+public:
+	static DirectoryRegistry& Default();
+
+	// systemDevice is the folder's own st_dev, checked on use.
+	void Register(dev_t device, ino_t node, dev_t systemDevice,
+		const std::string& path);
+	// B_ENTRY_NOT_FOUND when the folder is unknown or no longer there.
+	status_t Resolve(dev_t device, ino_t node, std::string* path);
+	// A folder (and so everything below it) now lies at to.
+	void Moved(const std::string& from, const std::string& to);
+	void Removed(const std::string& path);
+
+private:
+	struct Location {
+		std::string path;
+		dev_t systemDevice;
+	};
+
+	std::mutex fLock;
+	std::map<std::pair<dev_t, ino_t>, Location> fFolders;
+};
+
+}
+
+#endif
