@@ -1,14 +1,24 @@
 #ifndef _APPLICATION_H
 #define _APPLICATION_H
 
+#include <AppDefs.h>
 #include <Looper.h>
 #include <Messenger.h>
 
 struct app_info;
 class BWindow;
 
-// The program's application object. Run() runs in the calling (main) thread,
-// which also drives the display.
+namespace BPrivate {
+struct ApplicationData;
+}
+
+// The program's application object; there is one at a time (be_app). Run()
+// runs in the calling (main) thread, which also drives the display, and
+// starts with B_READY_TO_RUN (ReadyToRun), posted at construction. Quit, from
+// any thread, makes Run return after the current message; the object is not
+// deleted, as it belongs to main. B_ABOUT_REQUESTED calls AboutRequested.
+// The default QuitRequested asks each window to quit and quits those that
+// agree; the first that refuses keeps the application running.
 class BApplication : public BLooper {
 public:
 	BApplication(const char* signature);
@@ -38,6 +48,9 @@ public:
 	// The running executable's ref, its signature, thread and team.
 	status_t GetAppInfo(app_info* info) const;
 	const char* Signature() const;
+
+private:
+	std::unique_ptr<BPrivate::ApplicationData> fAppData;
 };
 
 extern BApplication* be_app;

@@ -7,6 +7,10 @@ class BHandler;
 class BLooper;
 class BMessage;
 
+namespace BPrivate {
+class MessengerAccess;
+}
+
 // A safe address of a handler in a looper. Sending to a target that has gone
 // away fails with B_BAD_PORT_ID or B_BAD_HANDLER instead of crashing.
 class BMessenger {
@@ -45,6 +49,8 @@ public:
 	team_id Team() const;
 
 private:
+	friend class BPrivate::MessengerAccess;
+
 	// Tokens into the kit's registries of loopers and handlers; a token of a
 	// deleted object never resolves again.
 	int32 fLooperToken;

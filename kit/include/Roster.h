@@ -19,9 +19,16 @@ struct app_info {
 };
 
 // On Linux, Launch opens a file or folder with the user's default application
-// for its type (through GIO). Each running program is its own team: TeamFor
-// knows only this program, and ActivateApp can only bring this program's
-// windows forward.
+// for its type (through GIO): B_ENTRY_NOT_FOUND when the ref names nothing,
+// B_LAUNCH_FAILED when no application handles it or it cannot start. Other
+// programs do not read BMessages, so initialMessage is not delivered, and
+// GIO does not say which process it started: appTeam is set to -1.
+//
+// Each running program is its own team (its process id), and the only one
+// known here is this program: TeamFor, IsRunning, GetAppInfo and
+// GetRunningAppInfo answer for this program's signature, executable or team
+// and fail (B_ERROR, B_BAD_TEAM_ID) for any other. ActivateApp of this
+// program's team sends the application B_APP_ACTIVATED ("active" true).
 class BRoster {
 public:
 	BRoster();

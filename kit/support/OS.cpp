@@ -29,5 +29,7 @@ thread_id find_thread(const char* name)
 	// Only the calling thread can be asked for; threads have no names here.
 	if (name != nullptr)
 		return B_NAME_NOT_FOUND;
-	return static_cast<thread_id>(syscall(SYS_gettid));
+	// Asked for on every lock and unlock; the kernel is asked once per thread.
+	static thread_local const thread_id self = static_cast<thread_id>(syscall(SYS_gettid));
+	return self;
 }
