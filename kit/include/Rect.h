@@ -42,8 +42,11 @@ public:
 	BRect& OffsetTo(float x, float y);
 	BRect& OffsetTo(BPoint where) { return OffsetTo(where.x, where.y); }
 	BRect InsetByCopy(float dx, float dy) const;
+	BRect InsetByCopy(BPoint delta) const { return InsetByCopy(delta.x, delta.y); }
 	BRect OffsetByCopy(float dx, float dy) const;
+	BRect OffsetByCopy(BPoint delta) const { return OffsetByCopy(delta.x, delta.y); }
 	BRect OffsetToCopy(float x, float y) const;
+	BRect OffsetToCopy(BPoint where) const { return OffsetToCopy(where.x, where.y); }
 
 	bool Contains(BPoint point) const;
 	bool Contains(BRect rect) const;
