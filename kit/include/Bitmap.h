@@ -11,7 +11,6 @@ class BWindow;
 
 namespace BPrivate {
 struct BitmapData;
-class BitmapAccess;
 }
 
 #define B_ANY_BYTES_PER_ROW (-1)
@@ -62,8 +61,6 @@ public:
 	bool IsLocked() const;
 
 private:
-	friend class BPrivate::BitmapAccess;
-
 	void _Init(BRect bounds, color_space space, bool acceptsViews);
 
 	std::unique_ptr<BPrivate::BitmapData> fData;

@@ -3,6 +3,10 @@
 
 #include <SupportDefs.h>
 
+namespace BPrivate {
+class FontAccess;
+}
+
 #define B_FONT_FAMILY_LENGTH 63
 #define B_FONT_STYLE_LENGTH 63
 
@@ -77,6 +81,7 @@ public:
 
 private:
 	friend class BView;
+	friend class BPrivate::FontAccess;
 
 	void _SetFrom(const BFont& font, uint32 mask);
 

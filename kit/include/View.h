@@ -229,7 +229,6 @@ private:
 	void _Attach(BWindow* window);
 	void _Detach();
 	void _ParentResized(float dx, float dy);
-	void _DrawBitmap(const BBitmap* bitmap, BRect bitmapRect, BRect viewRect);
 
 	std::unique_ptr<BPrivate::ViewData> fViewData;
 };

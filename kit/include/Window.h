@@ -66,7 +66,8 @@ enum {
 
 // A window on the screen: a looper whose thread starts with the first Show()
 // and dispatches the window's input and updates. frame is in screen
-// coordinates and covers the window's content, borders not included.
+// coordinates and covers the window's content, borders not included. Quit()
+// (from BLooper) closes and deletes it; QuitRequested answers true.
 class BWindow : public BLooper {
 public:
 	BWindow(BRect frame, const char* title, window_type type, uint32 flags,
@@ -75,9 +76,6 @@ public:
 		uint32 flags, uint32 workspace = B_CURRENT_WORKSPACE);
 	// Deletes the window's views.
 	virtual ~BWindow();
-
-	// Closes the window and deletes it (see BLooper::Quit).
-	virtual void Quit();
 
 	// Views; AddChild passes ownership of child to the window.
 	void AddChild(BView* child, BView* before = NULL);
@@ -91,9 +89,6 @@ public:
 	// Routes input to the view under the pointer (mouse messages) or to the
 	// focus view (keys), and updates to the views' Draw.
 	virtual void DispatchMessage(BMessage* message, BHandler* handler);
-	virtual void MessageReceived(BMessage* message);
-	virtual bool QuitRequested();
-	virtual thread_id Run();
 
 	// Hooks.
 	virtual void FrameMoved(BPoint newPosition);
@@ -148,11 +143,6 @@ private:
 
 	void _Init(BRect frame, const char* title, window_look look, window_feel feel,
 		uint32 flags, uint32 workspace);
-	void _HandleMouse(BMessage* message);
-	void _HandleKey(BMessage* message);
-	void _HandleWheel(BMessage* message);
-	void _SetActive(bool active);
-	void _Resized(float width, float height);
 
 	std::unique_ptr<BPrivate::WindowData> fWindowData;
 };

@@ -3,8 +3,27 @@
 #include <cstring>
 #include <new>
 
-#include "BitmapData.h"
+#include <View.h>
+#include <Window.h>
+
 #include "PixelFormat.h"
+
+namespace BPrivate {
+
+struct BitmapData {
+	BRect bounds;
+	color_space space = B_NO_COLOR_SPACE;
+	int32 width = 0;
+	int32 height = 0;
+	int32 bytesPerRow = 0;
+	std::unique_ptr<uint8[]> bits;
+	status_t status = B_NO_INIT;
+	// The hidden window holding the views of a bitmap that accepts them;
+	// declared after the pixels it draws on, so that it goes first.
+	std::unique_ptr<BWindow> window;
+};
+
+}
 
 using BPrivate::BitmapData;
 
@@ -62,8 +81,9 @@ void BBitmap::_Init(BRect bounds, color_space space, bool acceptsViews)
 		memset(data.bits.get(), B_TRANSPARENT_MAGIC_CMAP8, length);
 	else
 		memset(data.bits.get(), 0, length);
-	data.acceptsViews = acceptsViews;
 	data.status = B_OK;
+	if (acceptsViews)
+		data.window.reset(new BWindow(this));
 }
 
 BBitmap::~BBitmap() = default;
@@ -134,4 +154,51 @@ void BBitmap::SetBits(const void* data, int32 length, int32 offset,
 				BPrivate::ReadPixel(source + at, colorSpace));
 		}
 	}
+}
+
+void BBitmap::AddChild(BView* view)
+{
+	if (fData->window != nullptr)
+		fData->window->AddChild(view);
+}
+
+bool BBitmap::RemoveChild(BView* view)
+{
+	return fData->window != nullptr && fData->window->RemoveChild(view);
+}
+
+int32 BBitmap::CountChildren() const
+{
+	return fData->window != nullptr ? fData->window->CountChildren() : 0;
+}
+
+BView* BBitmap::ChildAt(int32 index) const
+{
+	return fData->window != nullptr ? fData->window->ChildAt(index) : nullptr;
+}
+
+BView* BBitmap::FindView(const char* name) const
+{
+	return fData->window != nullptr ? fData->window->FindView(name) : nullptr;
+}
+
+BView* BBitmap::FindView(BPoint point) const
+{
+	return fData->window != nullptr ? fData->window->FindView(point) : nullptr;
+}
+
+bool BBitmap::Lock()
+{
+	return fData->window != nullptr && fData->window->Lock();
+}
+
+void BBitmap::Unlock()
+{
+	if (fData->window != nullptr)
+		fData->window->Unlock();
+}
+
+bool BBitmap::IsLocked() const
+{
+	return fData->window != nullptr && fData->window->IsLocked();
 }
