@@ -11,8 +11,8 @@ using namespace TypeTest;
 
 TEST(MimeTypeTest, AcceptsOnlyWellFormedTypes)
 {
-	for (const char* valid : {"text/plain", "text", "application/x-vnd.be-directory",
-			"Application/X-Foo+XML"})
+	for (const char* valid : {"text/plain", "text",
+			"application/x-vnd.be-directory", "Application/X-Foo+XML"})
 		EXPECT_TRUE(BMimeType::IsValid(valid)) << valid;
 	std::string tooLong = "text/" + std::string(B_MIME_TYPE_LENGTH, 'a');
 	for (const char* invalid : {"", "/plain", "text/", "text/plain/x",

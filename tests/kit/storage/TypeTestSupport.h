@@ -83,7 +83,7 @@ struct Rgba {
 	uint8 red, green, blue, alpha;
 };
 
-inline void WritePng(const std::string& path, int32 size,
+inline std::vector<uint8> EncodePng(int32 size,
 	const std::function<Rgba(int32 x, int32 y)>& pixel)
 {
 	std::vector<Rgba> pixels;
@@ -96,8 +96,21 @@ inline void WritePng(const std::string& path, int32 size,
 	image.width = size;
 	image.height = size;
 	image.format = PNG_FORMAT_RGBA;
-	png_image_write_to_file(&image, path.c_str(), 0, pixels.data(), 0,
+	png_alloc_size_t length = 0;
+	png_image_write_to_memory(&image, nullptr, &length, 0, pixels.data(), 0,
 		nullptr);
+	std::vector<uint8> encoded(length);
+	png_image_write_to_memory(&image, encoded.data(), &length, 0,
+		pixels.data(), 0, nullptr);
+	return encoded;
+}
+
+inline void WritePng(const std::string& path, int32 size,
+	const std::function<Rgba(int32 x, int32 y)>& pixel)
+{
+	std::vector<uint8> encoded = EncodePng(size, pixel);
+	std::ofstream(path, std::ios::binary).write(
+		reinterpret_cast<const char*>(encoded.data()), encoded.size());
 }
 
 // An icon theme folder under root/icons/theme with the usual icon folders
