@@ -96,6 +96,8 @@ protected:
 	status_t _SetToRef(const entry_ref* ref, int openFlags);
 	status_t _SetToEntry(const BEntry* entry, int openFlags);
 	status_t _SetToAt(const BDirectory* dir, const char* path, int openFlags);
+	// Unsets the node, keeping status as its InitCheck.
+	status_t _Fail(status_t status);
 	int _FileDescriptor() const;
 	// Where the node is now, links resolved.
 	status_t _GetPath(std::string* path) const;

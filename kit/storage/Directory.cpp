@@ -182,8 +182,8 @@ status_t BDirectory::_Open(status_t status)
 			status = StatusFromErrno();
 	}
 	if (status != B_OK) {
-		Unset();
-		return status;
+		fIterator.reset();
+		return _Fail(status);
 	}
 	fIterator->node = st.st_ino;
 	BPrivate::DirectoryRegistry::Default().Register(_Device(), st.st_ino,

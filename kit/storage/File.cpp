@@ -129,9 +129,7 @@ status_t BFile::_CheckRegular(status_t status)
 			fcntl(_FileDescriptor(), F_GETFL) & ~O_NONBLOCK) != 0) {
 		status = StatusFromErrno();
 	}
-	if (status != B_OK)
-		Unset();
-	return status;
+	return status != B_OK ? _Fail(status) : B_OK;
 }
 
 bool BFile::IsReadable() const

@@ -201,6 +201,12 @@ status_t BNode::_Adopt(int fd)
 	return fCStatus = B_OK;
 }
 
+status_t BNode::_Fail(status_t status)
+{
+	Unset();
+	return fCStatus = status;
+}
+
 int BNode::_FileDescriptor() const
 {
 	return fData != nullptr ? fData->fd : -1;
@@ -318,6 +324,9 @@ status_t BNode::RewindAttrs()
 	return B_OK;
 }
 
+// A copy is a node of its own, with its own lock and position: the node is
+// opened again through the descriptor's /proc link, which reaches it
+// wherever it is now.
 BNode& BNode::operator=(const BNode& node)
 {
 	if (this == &node)
@@ -325,17 +334,11 @@ BNode& BNode::operator=(const BNode& node)
 	Unset();
 	if (node.fCStatus != B_OK)
 		return *this;
-	int fd = fcntl(node.fData->fd, F_DUPFD_CLOEXEC, 0);
-	if (fd < 0) {
-		fCStatus = BPrivate::StatusFromErrno();
-		return *this;
-	}
-	auto data = std::make_unique<NodeData>();
-	data->fd = fd;
-	data->pathOnly = node.fData->pathOnly;
-	data->device = node.fData->device;
-	fData = std::move(data);
-	fCStatus = B_OK;
+	int fd = node.fData->fd;
+	int flags = fcntl(fd, F_GETFL)
+		& (O_ACCMODE | O_APPEND | O_NONBLOCK | O_PATH);
+	std::string link = "/proc/self/fd/" + std::to_string(fd);
+	_Adopt(open(link.c_str(), flags | O_CLOEXEC | O_NOCTTY));
 	return *this;
 }
 
