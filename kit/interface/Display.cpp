@@ -155,22 +155,40 @@ bool Display::_Blocked(const DisplayWindow& window) const
 	return false;
 }
 
-void Display::PostMouse(const DisplayWindow& window, uint32 what, BPoint where,
+// The frontmost shown menu window; the caller holds fLock.
+std::shared_ptr<DisplayWindow> Display::_OpenMenu() const
+{
+	for (const auto& window : fWindows) {
+		std::lock_guard<std::mutex> guard(window->lock);
+		if (window->visible && window->feel == kMenuWindowFeel)
+			return window;
+	}
+	return nullptr;
+}
+
+void Display::PostMouse(const DisplayWindow& origin, uint32 what, BPoint where,
 	uint32 buttons, int32 clicks)
 {
 	BPoint screen;
 	{
-		std::lock_guard<std::mutex> guard(window.lock);
-		screen = where + window.frame.LeftTop();
+		std::lock_guard<std::mutex> guard(origin.lock);
+		screen = where + origin.frame.LeftTop();
 	}
 	uint32 modifiers;
+	std::shared_ptr<DisplayWindow> menu;
 	{
 		std::lock_guard<std::mutex> guard(fLock);
 		fPointer = screen;
 		fButtons = buttons;
 		modifiers = fModifiers;
-		if (what == B_MOUSE_DOWN && _Blocked(window))
+		menu = _OpenMenu();
+		if (what == B_MOUSE_DOWN && menu == nullptr && _Blocked(origin))
 			return;
+	}
+	const DisplayWindow& window = menu != nullptr ? *menu : origin;
+	if (menu != nullptr) {
+		std::lock_guard<std::mutex> guard(menu->lock);
+		where = screen - menu->frame.LeftTop();
 	}
 	BMessage message(what);
 	message.AddInt64("when", system_time());
@@ -187,7 +205,7 @@ void Display::PostWheel(const DisplayWindow& window, float dx, float dy)
 {
 	{
 		std::lock_guard<std::mutex> guard(fLock);
-		if (_Blocked(window))
+		if (_OpenMenu() != nullptr || _Blocked(window))
 			return;
 	}
 	BMessage message(B_MOUSE_WHEEL_CHANGED);
@@ -197,16 +215,19 @@ void Display::PostWheel(const DisplayWindow& window, float dx, float dy)
 	window.target.SendMessage(&message);
 }
 
-void Display::PostKey(const DisplayWindow& window, uint32 what, const char* bytes,
+void Display::PostKey(const DisplayWindow& origin, uint32 what, const char* bytes,
 	int32 key, int32 rawChar)
 {
 	uint32 modifiers;
+	std::shared_ptr<DisplayWindow> menu;
 	{
 		std::lock_guard<std::mutex> guard(fLock);
-		if (_Blocked(window))
+		menu = _OpenMenu();
+		if (menu == nullptr && _Blocked(origin))
 			return;
 		modifiers = fModifiers;
 	}
+	const DisplayWindow& window = menu != nullptr ? *menu : origin;
 	BMessage message(what);
 	message.AddInt64("when", system_time());
 	message.AddInt32("modifiers", int32(modifiers));

@@ -237,6 +237,10 @@ BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
 BView::~BView()
 {
 	ViewData& data = *fViewData;
+	for (BPrivate::ScrollFollower* bar : data.scrollBars) {
+		if (bar != nullptr)
+			bar->TargetDeleted();
+	}
 	if (data.parent != nullptr)
 		data.parent->RemoveChild(this);
 	else if (data.window != nullptr)
@@ -278,6 +282,8 @@ void BView::MakeFocus(bool focus)
 
 void BView::MessageReceived(BMessage* message)
 {
+	if (message->what == B_MOUSE_WHEEL_CHANGED && BPrivate::ScrollByWheel(this, message))
+		return;
 	BHandler::MessageReceived(message);
 }
 

@@ -64,6 +64,8 @@ void DeliverMouse(BWindow* window, BMessage* message)
 		}
 		case B_MOUSE_MOVED:
 		{
+			if (drag != nullptr)
+				drag->Moved(window->ConvertToScreen(where));
 			if (data.mouseView != nullptr) {
 				// A pressed view follows the pointer wherever it goes.
 				bool inside = target->Bounds().Contains(local);
@@ -89,8 +91,9 @@ void DeliverKey(BWindow* window, BMessage* message)
 	if (message->what == B_KEY_DOWN && (modifiers & (B_CONTROL_KEY | B_COMMAND_KEY)) != 0
 		&& data.shortcuts != nullptr && data.shortcuts->HandleShortcut(window, message))
 		return;
-	BView* target = data.focus;
 	const char* bytes = message->GetString("bytes", "");
+	BView* target = message->what == B_KEY_DOWN && bytes[0] == B_ENTER
+		&& data.defaultButton != nullptr ? data.defaultButton : data.focus;
 	if (target == nullptr)
 		return;
 	if (message->what == B_KEY_DOWN)
@@ -211,7 +214,8 @@ namespace BPrivate {
 void WindowAccess::ViewRemoved(BWindow* window, BView* view)
 {
 	WindowData& data = Data(window);
-	for (BView** pointer : {&data.focus, &data.mouseView, &data.lastMouseView}) {
+	for (BView** pointer : {&data.focus, &data.mouseView, &data.lastMouseView,
+			&data.defaultButton}) {
 		if (ViewAccess::Contains(view, *pointer))
 			*pointer = nullptr;
 	}

@@ -18,6 +18,16 @@ void SetShortcutHandler(BWindow* window, ShortcutHandler* handler)
 	WindowAccess::Data(window).shortcuts = handler;
 }
 
+void SetDefaultButton(BWindow* window, BView* button)
+{
+	WindowAccess::Data(window).defaultButton = button;
+}
+
+BView* DefaultButton(const BWindow* window)
+{
+	return WindowAccess::Data(window).defaultButton;
+}
+
 void SetDragSession(std::shared_ptr<DragSession> session)
 {
 	std::lock_guard<std::mutex> guard(sDragLock);

@@ -86,7 +86,8 @@ public:
 	void GetPointer(BPoint* screenWhere, uint32* buttons) const;
 
 	// where is in the window's coordinates. Input that a modal window
-	// blocks is dropped.
+	// blocks is dropped. While a menu window is shown, it takes the input of
+	// every window, as a pointer and keyboard grab would.
 	void PostMouse(const DisplayWindow& window, uint32 what, BPoint where,
 		uint32 buttons, int32 clicks);
 	void PostWheel(const DisplayWindow& window, float dx, float dy);
@@ -97,6 +98,7 @@ public:
 private:
 	Display();
 	bool _Blocked(const DisplayWindow& window) const;
+	std::shared_ptr<DisplayWindow> _OpenMenu() const;
 
 	std::unique_ptr<DisplayDriver> fDriver;
 	bool fHeadless = false;

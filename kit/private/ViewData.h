@@ -16,7 +16,13 @@ public:
 	virtual ~ScrollFollower() = default;
 	// origin is the view's new Bounds().LeftTop().
 	virtual void TargetScrolled(BPoint origin) = 0;
+	// The view is being deleted.
+	virtual void TargetDeleted() = 0;
 };
+
+// Scrolls view through its scroll bars by a B_MOUSE_WHEEL_CHANGED message;
+// false when it has no bar to scroll with.
+bool ScrollByWheel(BView* view, const BMessage* wheel);
 
 struct ViewData {
 	BView* parent = nullptr;

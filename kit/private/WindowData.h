@@ -39,6 +39,7 @@ struct WindowData {
 	// The view the pointer was last over.
 	BView* lastMouseView = nullptr;
 	ShortcutHandler* shortcuts = nullptr;
+	BView* defaultButton = nullptr;
 
 	// What the views draw on: the window's framebuffer, or for the window
 	// behind a bitmap, the bitmap's bits.

@@ -6,6 +6,7 @@
 #include <Window.h>
 
 class BMessage;
+class BView;
 
 namespace BPrivate {
 
@@ -26,6 +27,12 @@ public:
 // NULL removes it. Call with the window locked.
 void SetShortcutHandler(BWindow* window, ShortcutHandler* handler);
 
+// The button that Enter presses wherever the focus is (BButton::MakeDefault):
+// the window gives it every B_KEY_DOWN of B_ENTER. NULL for none. Call with
+// the window locked.
+void SetDefaultButton(BWindow* window, BView* button);
+BView* DefaultButton(const BWindow* window);
+
 // A drag in progress, started by BView::DragMessage. While one is set,
 // MouseMoved hooks receive its message, and the window that receives the
 // release of the buttons hands the release over (in that window's thread,
@@ -35,6 +42,8 @@ class DragSession {
 public:
 	virtual ~DragSession() = default;
 	virtual const BMessage* Message() const = 0;
+	// Every B_MOUSE_MOVED a window receives while the drag lasts.
+	virtual void Moved(BPoint screenWhere) = 0;
 	virtual void Released(BPoint screenWhere) = 0;
 };
 
