@@ -1,7 +1,8 @@
 #include "SystemPalette.h"
 
-#include <algorithm>
 #include <array>
+#include <cmath>
+#include <vector>
 
 namespace BPrivate {
 
@@ -9,35 +10,21 @@ namespace {
 
 constexpr int kCubeLevels[6] = {0, 51, 102, 153, 204, 255};
 
+// Each bin of the 15-bit colour cube lists the entries that can be nearest
+// to some colour in it: those within the distance of the nearest to the
+// bin's centre plus the bin's diagonal. A lookup then only compares those.
 struct PaletteTables {
 	std::array<rgb_color, 256> colors;
-	// Packed 0xRRGGBB of each opaque entry, sorted, with its index alongside.
-	std::array<uint32, 255> sortedKeys;
-	std::array<uint8, 255> sortedIndex;
-	std::array<uint8, 32768> nearest;
+	std::array<uint32, 32769> binStart;
+	std::vector<uint8> candidates;
 };
 
-uint32 PackKey(uint8 red, uint8 green, uint8 blue)
+int32 Distance(const rgb_color& color, int32 red, int32 green, int32 blue)
 {
-	return (uint32(red) << 16) | (uint32(green) << 8) | blue;
-}
-
-uint8 SearchNearest(const std::array<rgb_color, 256>& colors, int red, int green,
-	int blue)
-{
-	int best = 0;
-	int bestDistance = 1 << 30;
-	for (int i = 0; i < 255; i++) {
-		int dr = colors[i].red - red;
-		int dg = colors[i].green - green;
-		int db = colors[i].blue - blue;
-		int distance = dr * dr + dg * dg + db * db;
-		if (distance < bestDistance) {
-			bestDistance = distance;
-			best = i;
-		}
-	}
-	return uint8(best);
+	int32 dr = color.red - red;
+	int32 dg = color.green - green;
+	int32 db = color.blue - blue;
+	return dr * dr + dg * dg + db * db;
 }
 
 void FillColors(std::array<rgb_color, 256>& colors)
@@ -75,22 +62,27 @@ PaletteTables BuildTables()
 {
 	PaletteTables tables;
 	FillColors(tables.colors);
-
-	std::array<std::pair<uint32, uint8>, 255> keyed;
-	for (int i = 0; i < 255; i++) {
-		const rgb_color& c = tables.colors[i];
-		keyed[i] = {PackKey(c.red, c.green, c.blue), uint8(i)};
+	// Twice the farthest a colour lies from its bin's centre (4 times the
+	// square root of 3, rounded up).
+	const double kReach = 2 * 7.0;
+	std::array<int32, 255> distances;
+	for (int32 bin = 0; bin < 32768; bin++) {
+		tables.binStart[bin] = uint32(tables.candidates.size());
+		int32 red = ((bin >> 10) << 3) + 4;
+		int32 green = (((bin >> 5) & 31) << 3) + 4;
+		int32 blue = ((bin & 31) << 3) + 4;
+		int32 nearest = 1 << 30;
+		for (int32 i = 0; i < 255; i++) {
+			distances[i] = Distance(tables.colors[i], red, green, blue);
+			nearest = min_c(nearest, distances[i]);
+		}
+		double limit = std::sqrt(double(nearest)) + kReach;
+		for (int32 i = 0; i < 255; i++) {
+			if (distances[i] <= limit * limit)
+				tables.candidates.push_back(uint8(i));
+		}
 	}
-	std::sort(keyed.begin(), keyed.end());
-	for (int i = 0; i < 255; i++) {
-		tables.sortedKeys[i] = keyed[i].first;
-		tables.sortedIndex[i] = keyed[i].second;
-	}
-
-	for (int bin = 0; bin < 32768; bin++) {
-		tables.nearest[bin] = SearchNearest(tables.colors,
-			((bin >> 10) << 3) + 4, (((bin >> 5) & 31) << 3) + 4, ((bin & 31) << 3) + 4);
-	}
+	tables.binStart[32768] = uint32(tables.candidates.size());
 	return tables;
 }
 
@@ -110,11 +102,18 @@ rgb_color ColorForIndex(uint8 index)
 uint8 IndexForColor(uint8 red, uint8 green, uint8 blue)
 {
 	const PaletteTables& tables = Tables();
-	uint32 key = PackKey(red, green, blue);
-	auto found = std::lower_bound(tables.sortedKeys.begin(), tables.sortedKeys.end(), key);
-	if (found != tables.sortedKeys.end() && *found == key)
-		return tables.sortedIndex[found - tables.sortedKeys.begin()];
-	return tables.nearest[((red >> 3) << 10) | ((green >> 3) << 5) | (blue >> 3)];
+	int32 bin = ((red >> 3) << 10) | ((green >> 3) << 5) | (blue >> 3);
+	uint8 best = 0;
+	int32 bestDistance = 1 << 30;
+	for (uint32 i = tables.binStart[bin]; i < tables.binStart[bin + 1]; i++) {
+		uint8 index = tables.candidates[i];
+		int32 distance = Distance(tables.colors[index], red, green, blue);
+		if (distance < bestDistance || (distance == bestDistance && index < best)) {
+			bestDistance = distance;
+			best = index;
+		}
+	}
+	return best;
 }
 
 }

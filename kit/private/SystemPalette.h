@@ -19,8 +19,8 @@ namespace BPrivate {
 //   255      B_TRANSPARENT_MAGIC_CMAP8, shown as B_TRANSPARENT_COLOR.
 rgb_color ColorForIndex(uint8 index);
 
-// The index of the nearest opaque colour (never the transparent index).
-// Colours of the map give their own index; others go through a 15-bit table.
+// The index of the nearest opaque colour by distance in RGB (never the
+// transparent index); colours of the map give their own index.
 uint8 IndexForColor(uint8 red, uint8 green, uint8 blue);
 
 inline uint8 IndexForColor(rgb_color color)

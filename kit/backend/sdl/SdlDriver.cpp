@@ -381,15 +381,8 @@ void SdlDriver::_HandleWindowEvent(NativeWindow& native, const SDL_WindowEvent& 
 	}
 }
 
-// Keys go to a menu while one is open: menus are pop-up windows that SDL
-// never gives the keyboard to.
 const DisplayWindow* SdlDriver::_KeyTarget(Uint32 windowID)
 {
-	for (const auto& window : Display::Default().Windows()) {
-		std::lock_guard<std::mutex> guard(window->lock);
-		if (window->visible && window->feel == kMenuWindowFeel && _Native(window.get()))
-			return window.get();
-	}
 	NativeWindow* native = _NativeFor(windowID);
 	return native != nullptr ? native->window.get() : nullptr;
 }
