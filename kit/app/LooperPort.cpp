@@ -239,7 +239,7 @@ void LooperPort::SetRunning(bool running)
 bool LooperPort::IsIdle() const
 {
 	std::lock_guard<std::mutex> lock(fMutex);
-	return fClosed || !fRunning || fModalDepth > 0
+	return fClosed || !fRunning || fModalDepth > fModalEndedEarly
 		|| (fQueue.empty() && !fDispatching);
 }
 
@@ -252,11 +252,26 @@ void LooperPort::EnterModal()
 	NotifyIdle();
 }
 
+void LooperPort::EndModalEarly()
+{
+	{
+		std::lock_guard<std::mutex> lock(fMutex);
+		if (fModalDepth == fModalEndedEarly)
+			return;
+		fModalEndedEarly++;
+	}
+	NotifyBusy();
+}
+
 void LooperPort::LeaveModal()
 {
 	{
 		std::lock_guard<std::mutex> lock(fMutex);
 		fModalDepth--;
+		if (fModalEndedEarly > 0) {
+			fModalEndedEarly--;
+			return;
+		}
 	}
 	NotifyBusy();
 }

@@ -63,6 +63,9 @@ public:
 	void SetRunning(bool running);
 	bool IsIdle() const;
 	void EnterModal();
+	// A modal wait ended by the thread that releases it (EndModalWait),
+	// before the blocked thread leaves its scope.
+	void EndModalEarly();
 	void LeaveModal();
 
 private:
@@ -79,6 +82,7 @@ private:
 	bool fDispatching = false;
 	bool fRunning = false;
 	int32 fModalDepth = 0;
+	int32 fModalEndedEarly = 0;
 	thread_id fOwner = -1;
 	int32 fLockCount = 0;
 	thread_id fThread = -1;

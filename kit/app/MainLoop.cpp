@@ -101,4 +101,10 @@ ModalWaitScope::~ModalWaitScope()
 		LooperAccess::Port(looper)->LeaveModal();
 }
 
+void EndModalWait(thread_id waitingThread)
+{
+	if (BLooper* looper = BLooper::LooperForThread(waitingThread))
+		LooperAccess::Port(looper)->EndModalEarly();
+}
+
 }

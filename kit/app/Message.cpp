@@ -55,7 +55,8 @@ MessageData& MessageData::operator=(const MessageData& other)
 	target = other.target;
 	preferredTarget = other.preferredTarget;
 	returnAddress = other.returnAddress;
-	ticket = other.ticket;
+	// The sender waits on the delivered message only, never on copies.
+	ticket.reset();
 	previous = other.previous;
 	return *this;
 }

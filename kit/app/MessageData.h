@@ -44,7 +44,7 @@ struct MessageField {
 // Where the answer to a synchronous send goes. The first answer wins.
 class ReplySlot {
 public:
-	status_t Answer(const BMessage& reply);
+	status_t Answer(std::unique_ptr<BMessage> reply);
 	bool IsAnswered();
 	// Copies the answer into reply; B_TIMED_OUT when none came in time.
 	status_t Wait(bigtime_t timeout, BMessage* reply);
@@ -55,8 +55,9 @@ private:
 	std::unique_ptr<BMessage> fReply;
 };
 
-// Shared by every copy of a message whose sender waits for an answer. When
-// the last copy goes away unanswered, the sender gets B_NO_REPLY.
+// Held by the one delivered message whose sender waits for an answer (copies
+// do not take it along). When that message goes away unanswered, the sender
+// gets B_NO_REPLY.
 struct ReplyTicket {
 	explicit ReplyTicket(std::shared_ptr<ReplySlot> replySlot)
 		: slot(std::move(replySlot)) {}

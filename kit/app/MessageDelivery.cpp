@@ -14,15 +14,13 @@ using BPrivate::MessageData;
 
 namespace BPrivate {
 
-status_t ReplySlot::Answer(const BMessage& reply)
+status_t ReplySlot::Answer(std::unique_ptr<BMessage> reply)
 {
-	// Made before taking the mutex, and dropped after it if refused.
-	auto copy = std::make_unique<BMessage>(reply);
 	{
 		std::lock_guard<std::mutex> lock(fMutex);
 		if (fReply != nullptr)
 			return B_DUPLICATE_REPLY;
-		fReply = std::move(copy);
+		fReply = std::move(reply);
 	}
 	fAnswered.notify_all();
 	return B_OK;
@@ -40,14 +38,16 @@ status_t ReplySlot::Wait(bigtime_t timeout, BMessage* reply)
 	if (!WaitWithTimeout(fAnswered, lock, timeout, [this] { return fReply != nullptr; }))
 		return B_TIMED_OUT;
 	*reply = *fReply;
+	// The replier may wait for an answer to its reply.
+	MessageAccess::Data(*reply).ticket = std::move(MessageAccess::Data(*fReply).ticket);
 	return B_OK;
 }
 
 ReplyTicket::~ReplyTicket()
 {
-	BMessage noReply(B_NO_REPLY);
-	MessageAccess::Data(noReply).isReply = true;
-	slot->Answer(noReply);
+	auto noReply = std::make_unique<BMessage>(B_NO_REPLY);
+	MessageAccess::Data(*noReply).isReply = true;
+	slot->Answer(std::move(noReply));
 }
 
 }
@@ -66,8 +66,8 @@ status_t DeliverReply(const BMessage& original, const BMessage* reply,
 	if (!data.delivered)
 		return B_BAD_REPLY;
 
-	BMessage answer(*reply);
-	MessageData& answerData = MessageAccess::Data(answer);
+	auto answer = std::make_unique<BMessage>(*reply);
+	MessageData& answerData = MessageAccess::Data(*answer);
 	answerData.ClearDelivery();
 	answerData.isReply = true;
 	auto previous = std::make_shared<BMessage>(original);
@@ -78,13 +78,13 @@ status_t DeliverReply(const BMessage& original, const BMessage* reply,
 		answerData.delivered = true;
 		answerData.returnAddress = replyTo;
 		answerData.ticket = std::move(ticket);
-		return data.ticket->slot->Answer(answer);
+		return data.ticket->slot->Answer(std::move(answer));
 	}
 	const BMessenger target = data.returnAddress.IsValid()
 		? data.returnAddress : be_app_messenger;
 	if (!target.IsValid())
 		return B_BAD_REPLY;
-	return BPrivate::MessengerAccess::Deliver(target, answer, replyTo, std::move(ticket));
+	return BPrivate::MessengerAccess::Deliver(target, *answer, replyTo, std::move(ticket));
 }
 
 }

@@ -40,9 +40,14 @@ status_t MessengerAccess::Deliver(const BMessenger& target, const BMessage& mess
 	std::shared_ptr<LooperPort> port = tokens.PortFor(target.fLooperToken);
 	if (port == nullptr)
 		return B_BAD_PORT_ID;
+	// A quitting looper lets its handlers go after closing its port: a
+	// handler missing from a closed port means the looper is gone.
 	if (!target.fPreferredTarget
-		&& tokens.HandlerIn(target.fHandlerToken, target.fLooperToken) == nullptr)
+		&& tokens.HandlerIn(target.fHandlerToken, target.fLooperToken) == nullptr) {
+		if (port->IsClosed())
+			return B_BAD_PORT_ID;
 		return B_BAD_HANDLER;
+	}
 
 	auto copy = std::make_unique<BMessage>(message);
 	MessageData& data = MessageAccess::Data(*copy);
