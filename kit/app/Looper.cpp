@@ -356,6 +356,9 @@ team_id BLooper::Team() const
 
 BLooper* BLooper::LooperForThread(thread_id thread)
 {
+	// Loopers that never ran have no thread (-1).
+	if (thread < 0)
+		return nullptr;
 	for (const auto& port : TokenSpace::Default().Ports()) {
 		if (port->Thread() == thread)
 			return port->Looper();

@@ -16,42 +16,96 @@ using BPrivate::MessageData;
 
 namespace {
 
-template<typename T>
-status_t AddFixed(MessageData& data, const char* name, type_code type, const T& value)
+// Store's index for a value added at the end.
+constexpr int32 kAppend = -1;
+
+status_t Store(MessageData& data, const char* name, type_code type, int32 index,
+	const void* bytes, ssize_t size, bool fixedSize)
 {
-	return data.Add(name, type, &value, sizeof(T), true);
+	if (index == kAppend)
+		return data.Add(name, type, bytes, size, fixedSize);
+	return data.Replace(name, type, index, bytes, size);
+}
+
+// Hands the bytes of a value to read, after the checks every Find makes.
+template<typename Target, typename Read>
+status_t FindValue(const MessageData& data, const char* name, type_code type,
+	int32 index, Target* target, Read read)
+{
+	if (target == nullptr)
+		return B_BAD_VALUE;
+	const void* bytes;
+	ssize_t size;
+	status_t status = data.Find(name, type, index, &bytes, &size);
+	return status == B_OK ? read(bytes, size) : status;
+}
+
+template<typename T>
+status_t StoreFixed(MessageData& data, const char* name, type_code type,
+	int32 index, const T& value)
+{
+	return Store(data, name, type, index, &value, sizeof(T), true);
 }
 
 template<typename T>
 status_t FindFixed(const MessageData& data, const char* name, type_code type,
 	int32 index, T* value)
 {
-	if (value == nullptr)
+	return FindValue(data, name, type, index, value,
+		[value](const void* bytes, ssize_t size) -> status_t {
+			// Raw data added under this type with another size is not a T.
+			if (size != static_cast<ssize_t>(sizeof(T)))
+				return B_BAD_DATA;
+			*value = BPrivate::ReadFixed<T>(bytes);
+			return B_OK;
+		});
+}
+
+status_t StoreString(MessageData& data, const char* name, int32 index,
+	const char* string)
+{
+	if (string == nullptr)
 		return B_BAD_VALUE;
-	const void* bytes;
-	ssize_t size;
-	status_t status = data.Find(name, type, index, &bytes, &size);
+	return Store(data, name, B_STRING_TYPE, index, string, std::strlen(string) + 1,
+		false);
+}
+
+// Refs are kept in their one flat form.
+status_t StoreRef(MessageData& data, const char* name, int32 index,
+	const entry_ref* ref)
+{
+	if (ref == nullptr)
+		return B_BAD_VALUE;
+	std::vector<char> flat(BPrivate::FlattenedRefSize(*ref));
+	BPrivate::FlattenRef(*ref, flat.data(), flat.size());
+	return Store(data, name, B_REF_TYPE, index, flat.data(), flat.size(), false);
+}
+
+status_t StoreMessage(MessageData& data, const char* name, int32 index,
+	const BMessage* message)
+{
+	if (message == nullptr)
+		return B_BAD_VALUE;
+	std::vector<char> flat(message->FlattenedSize());
+	message->Flatten(flat.data(), flat.size());
+	return Store(data, name, B_MESSAGE_TYPE, index, flat.data(), flat.size(), false);
+}
+
+// A flattenable object is kept under its own type code.
+status_t StoreFlat(MessageData& data, const char* name, int32 index,
+	const BFlattenable* object)
+{
+	if (object == nullptr)
+		return B_BAD_VALUE;
+	const ssize_t size = object->FlattenedSize();
+	if (size <= 0)
+		return B_BAD_VALUE;
+	std::vector<char> flat(size);
+	status_t status = object->Flatten(flat.data(), size);
 	if (status != B_OK)
 		return status;
-	// Raw data added under this type with another size is not a T.
-	if (size != static_cast<ssize_t>(sizeof(T)))
-		return B_BAD_DATA;
-	*value = BPrivate::ReadFixed<T>(bytes);
-	return B_OK;
-}
-
-std::vector<char> FlattenedRef(const entry_ref& ref)
-{
-	std::vector<char> buffer(BPrivate::FlattenedRefSize(ref));
-	BPrivate::FlattenRef(ref, buffer.data(), buffer.size());
-	return buffer;
-}
-
-std::vector<char> FlattenedMessage(const BMessage& message)
-{
-	std::vector<char> buffer(message.FlattenedSize());
-	message.Flatten(buffer.data(), buffer.size());
-	return buffer;
+	return Store(data, name, object->TypeCode(), index, flat.data(), size,
+		object->IsFixedSize());
 }
 
 }
@@ -59,7 +113,7 @@ std::vector<char> FlattenedMessage(const BMessage& message)
 #define FIXED_ADD_FIND(Name, Type, Code) \
 	status_t BMessage::Add##Name(const char* name, Type value) \
 	{ \
-		return AddFixed(*fData, name, Code, value); \
+		return StoreFixed(*fData, name, Code, kAppend, value); \
 	} \
 	status_t BMessage::Find##Name(const char* name, Type* value) const \
 	{ \
@@ -77,7 +131,18 @@ std::vector<char> FlattenedMessage(const BMessage& message)
 	} \
 	status_t BMessage::Replace##Name(const char* name, int32 index, Type value) \
 	{ \
-		return fData->Replace(name, Code, index, &value, sizeof(Type)); \
+		return StoreFixed(*fData, name, Code, index, value); \
+	}
+
+// The forms without an index address the first value.
+#define FIRST_VALUE_FORMS(Name, FindType, ReplaceType) \
+	status_t BMessage::Find##Name(const char* name, FindType value) const \
+	{ \
+		return Find##Name(name, 0, value); \
+	} \
+	status_t BMessage::Replace##Name(const char* name, ReplaceType value) \
+	{ \
+		return Replace##Name(name, 0, value); \
 	}
 
 #define HAS(Name, Code) \
@@ -111,6 +176,12 @@ FIXED_REPLACE(Float, float, B_FLOAT_TYPE)
 FIXED_REPLACE(Double, double, B_DOUBLE_TYPE)
 FIXED_REPLACE(Pointer, const void*, B_POINTER_TYPE)
 
+FIRST_VALUE_FORMS(String, const char**, const char*)
+FIRST_VALUE_FORMS(Messenger, BMessenger*, BMessenger)
+FIRST_VALUE_FORMS(Ref, entry_ref*, const entry_ref*)
+FIRST_VALUE_FORMS(Message, BMessage*, const BMessage*)
+FIRST_VALUE_FORMS(Flat, BFlattenable*, BFlattenable*)
+
 HAS(Rect, B_RECT_TYPE)
 HAS(Point, B_POINT_TYPE)
 HAS(String, B_STRING_TYPE)
@@ -128,13 +199,12 @@ HAS(Message, B_MESSAGE_TYPE)
 
 #undef FIXED_ADD_FIND
 #undef FIXED_REPLACE
+#undef FIRST_VALUE_FORMS
 #undef HAS
-
-// Pointers
 
 status_t BMessage::AddPointer(const char* name, const void* pointer)
 {
-	return AddFixed(*fData, name, B_POINTER_TYPE, pointer);
+	return StoreFixed(*fData, name, B_POINTER_TYPE, kAppend, pointer);
 }
 
 status_t BMessage::FindPointer(const char* name, void** pointer) const
@@ -147,229 +217,114 @@ status_t BMessage::FindPointer(const char* name, int32 index, void** pointer) co
 	return FindFixed(*fData, name, B_POINTER_TYPE, index, pointer);
 }
 
-// Strings, stored with their terminating NUL
-
 status_t BMessage::AddString(const char* name, const char* string)
 {
-	if (string == nullptr)
-		return B_BAD_VALUE;
-	return fData->Add(name, B_STRING_TYPE, string, std::strlen(string) + 1, false);
+	return StoreString(*fData, name, kAppend, string);
 }
 
-status_t BMessage::FindString(const char* name, const char** string) const
+status_t BMessage::ReplaceString(const char* name, int32 index, const char* string)
 {
-	return FindString(name, 0, string);
+	return StoreString(*fData, name, index, string);
 }
 
 status_t BMessage::FindString(const char* name, int32 index,
 	const char** string) const
 {
-	if (string == nullptr)
-		return B_BAD_VALUE;
-	const void* bytes;
-	ssize_t size;
-	status_t status = fData->Find(name, B_STRING_TYPE, index, &bytes, &size);
-	if (status != B_OK)
-		return status;
-	if (static_cast<const char*>(bytes)[size - 1] != '\0')
-		return B_BAD_DATA;
-	*string = static_cast<const char*>(bytes);
-	return B_OK;
+	return FindValue(*fData, name, B_STRING_TYPE, index, string,
+		[string](const void* bytes, ssize_t size) -> status_t {
+			const char* text = static_cast<const char*>(bytes);
+			if (text[size - 1] != '\0')
+				return B_BAD_DATA;
+			*string = text;
+			return B_OK;
+		});
 }
-
-status_t BMessage::ReplaceString(const char* name, const char* string)
-{
-	return ReplaceString(name, 0, string);
-}
-
-status_t BMessage::ReplaceString(const char* name, int32 index, const char* string)
-{
-	if (string == nullptr)
-		return B_BAD_VALUE;
-	return fData->Replace(name, B_STRING_TYPE, index, string, std::strlen(string) + 1);
-}
-
-// Refs, in their one flat form
 
 status_t BMessage::AddRef(const char* name, const entry_ref* ref)
 {
-	if (ref == nullptr)
-		return B_BAD_VALUE;
-	std::vector<char> flat = FlattenedRef(*ref);
-	return fData->Add(name, B_REF_TYPE, flat.data(), flat.size(), false);
-}
-
-status_t BMessage::FindRef(const char* name, entry_ref* ref) const
-{
-	return FindRef(name, 0, ref);
-}
-
-status_t BMessage::FindRef(const char* name, int32 index, entry_ref* ref) const
-{
-	if (ref == nullptr)
-		return B_BAD_VALUE;
-	const void* bytes;
-	ssize_t size;
-	status_t status = fData->Find(name, B_REF_TYPE, index, &bytes, &size);
-	if (status != B_OK)
-		return status;
-	return BPrivate::UnflattenRef(ref, bytes, size);
-}
-
-status_t BMessage::ReplaceRef(const char* name, const entry_ref* ref)
-{
-	return ReplaceRef(name, 0, ref);
+	return StoreRef(*fData, name, kAppend, ref);
 }
 
 status_t BMessage::ReplaceRef(const char* name, int32 index, const entry_ref* ref)
 {
-	if (ref == nullptr)
-		return B_BAD_VALUE;
-	std::vector<char> flat = FlattenedRef(*ref);
-	return fData->Replace(name, B_REF_TYPE, index, flat.data(), flat.size());
+	return StoreRef(*fData, name, index, ref);
 }
 
-// Messages, flattened
+status_t BMessage::FindRef(const char* name, int32 index, entry_ref* ref) const
+{
+	return FindValue(*fData, name, B_REF_TYPE, index, ref,
+		[ref](const void* bytes, ssize_t size) {
+			return BPrivate::UnflattenRef(ref, bytes, size);
+		});
+}
 
 status_t BMessage::AddMessage(const char* name, const BMessage* message)
 {
-	if (message == nullptr)
-		return B_BAD_VALUE;
-	std::vector<char> flat = FlattenedMessage(*message);
-	return fData->Add(name, B_MESSAGE_TYPE, flat.data(), flat.size(), false);
-}
-
-status_t BMessage::FindMessage(const char* name, BMessage* message) const
-{
-	return FindMessage(name, 0, message);
-}
-
-status_t BMessage::FindMessage(const char* name, int32 index,
-	BMessage* message) const
-{
-	if (message == nullptr)
-		return B_BAD_VALUE;
-	const void* bytes;
-	ssize_t size;
-	status_t status = fData->Find(name, B_MESSAGE_TYPE, index, &bytes, &size);
-	if (status != B_OK)
-		return status;
-	return BPrivate::UnflattenMessage(message, static_cast<const char*>(bytes), size);
-}
-
-status_t BMessage::ReplaceMessage(const char* name, const BMessage* message)
-{
-	return ReplaceMessage(name, 0, message);
+	return StoreMessage(*fData, name, kAppend, message);
 }
 
 status_t BMessage::ReplaceMessage(const char* name, int32 index,
 	const BMessage* message)
 {
-	if (message == nullptr)
-		return B_BAD_VALUE;
-	std::vector<char> flat = FlattenedMessage(*message);
-	return fData->Replace(name, B_MESSAGE_TYPE, index, flat.data(), flat.size());
+	return StoreMessage(*fData, name, index, message);
 }
 
-// Messengers
+status_t BMessage::FindMessage(const char* name, int32 index,
+	BMessage* message) const
+{
+	return FindValue(*fData, name, B_MESSAGE_TYPE, index, message,
+		[message](const void* bytes, ssize_t size) {
+			return BPrivate::UnflattenMessage(message, static_cast<const char*>(bytes),
+				size);
+		});
+}
 
 status_t BMessage::AddMessenger(const char* name, BMessenger messenger)
 {
-	return AddFixed(*fData, name, B_MESSENGER_TYPE,
+	return StoreFixed(*fData, name, B_MESSENGER_TYPE, kAppend,
 		BPrivate::MessengerAccess::Flatten(messenger));
-}
-
-status_t BMessage::FindMessenger(const char* name, BMessenger* messenger) const
-{
-	return FindMessenger(name, 0, messenger);
-}
-
-status_t BMessage::FindMessenger(const char* name, int32 index,
-	BMessenger* messenger) const
-{
-	if (messenger == nullptr)
-		return B_BAD_VALUE;
-	BPrivate::FlatMessenger flat;
-	status_t status = FindFixed(*fData, name, B_MESSENGER_TYPE, index, &flat);
-	if (status == B_OK)
-		*messenger = BPrivate::MessengerAccess::Unflatten(flat);
-	return status;
-}
-
-status_t BMessage::ReplaceMessenger(const char* name, BMessenger messenger)
-{
-	return ReplaceMessenger(name, 0, messenger);
 }
 
 status_t BMessage::ReplaceMessenger(const char* name, int32 index,
 	BMessenger messenger)
 {
-	BPrivate::FlatMessenger flat = BPrivate::MessengerAccess::Flatten(messenger);
-	return fData->Replace(name, B_MESSENGER_TYPE, index, &flat, sizeof(flat));
+	return StoreFixed(*fData, name, B_MESSENGER_TYPE, index,
+		BPrivate::MessengerAccess::Flatten(messenger));
 }
 
-// Flattenable objects, stored under their own type code
-
-namespace {
-
-std::vector<char> FlattenedObject(const BFlattenable& object, status_t* status)
+status_t BMessage::FindMessenger(const char* name, int32 index,
+	BMessenger* messenger) const
 {
-	ssize_t size = object.FlattenedSize();
-	std::vector<char> buffer(size > 0 ? size : 0);
-	*status = size > 0 ? object.Flatten(buffer.data(), size) : B_BAD_VALUE;
-	return buffer;
-}
-
+	BPrivate::FlatMessenger flat;
+	status_t status = FindFixed(*fData, name, B_MESSENGER_TYPE, index,
+		messenger != nullptr ? &flat : nullptr);
+	if (status == B_OK)
+		*messenger = BPrivate::MessengerAccess::Unflatten(flat);
+	return status;
 }
 
 status_t BMessage::AddFlat(const char* name, BFlattenable* object,
 	int32 /*count: a size hint only*/)
 {
-	if (object == nullptr)
-		return B_BAD_VALUE;
-	status_t status;
-	std::vector<char> flat = FlattenedObject(*object, &status);
-	if (status != B_OK)
-		return status;
-	return fData->Add(name, object->TypeCode(), flat.data(), flat.size(),
-		object->IsFixedSize());
+	return StoreFlat(*fData, name, kAppend, object);
 }
 
-status_t BMessage::FindFlat(const char* name, BFlattenable* object) const
+status_t BMessage::ReplaceFlat(const char* name, int32 index, BFlattenable* object)
 {
-	return FindFlat(name, 0, object);
+	return StoreFlat(*fData, name, index, object);
 }
 
 status_t BMessage::FindFlat(const char* name, int32 index,
 	BFlattenable* object) const
 {
-	if (object == nullptr)
-		return B_BAD_VALUE;
-	const void* bytes;
-	ssize_t size;
-	status_t status = fData->Find(name, B_ANY_TYPE, index, &bytes, &size);
-	if (status != B_OK)
-		return status;
-	const type_code type = fData->FindField(name)->type;
-	if (!object->AllowsTypeCode(type))
-		return B_BAD_TYPE;
-	return object->Unflatten(type, bytes, size);
-}
-
-status_t BMessage::ReplaceFlat(const char* name, BFlattenable* object)
-{
-	return ReplaceFlat(name, 0, object);
-}
-
-status_t BMessage::ReplaceFlat(const char* name, int32 index, BFlattenable* object)
-{
-	if (object == nullptr)
-		return B_BAD_VALUE;
-	status_t status;
-	std::vector<char> flat = FlattenedObject(*object, &status);
-	if (status != B_OK)
-		return status;
-	return fData->Replace(name, object->TypeCode(), index, flat.data(), flat.size());
+	// Any field whose type the object accepts will do.
+	return FindValue(*fData, name, B_ANY_TYPE, index, object,
+		[this, name, object](const void* bytes, ssize_t size) -> status_t {
+			const type_code type = fData->FindField(name)->type;
+			if (!object->AllowsTypeCode(type))
+				return B_BAD_TYPE;
+			return object->Unflatten(type, bytes, size);
+		});
 }
 
 bool BMessage::HasFlat(const char* name, const BFlattenable* object) const
@@ -385,7 +340,7 @@ bool BMessage::HasFlat(const char* name, int32 index,
 	return object->AllowsTypeCode(fData->FindField(name)->type);
 }
 
-// Values with defaults
+// Values with defaults for missing or mistyped fields
 
 bool BMessage::GetBool(const char* name, bool defaultValue) const
 {
