@@ -70,19 +70,27 @@ int32 Painter::_PenWidth() const
 	return max_c(int32(1), PixelCoordinate(fState.penSize));
 }
 
-template <typename PlotFunction>
-void Painter::_ForEachPixel(const IntRect& rect, PlotFunction plot)
+template <typename AreaFunction>
+void Painter::_ForEachArea(const IntRect& rect, AreaFunction draw)
 {
 	for (const IntRect& clip : fClip.Rects()) {
 		IntRect area = rect & clip & fSurface.Bounds();
 		if (!area.IsValid())
 			continue;
 		fTouched = fTouched | area;
+		draw(area);
+	}
+}
+
+template <typename PlotFunction>
+void Painter::_ForEachPixel(const IntRect& rect, PlotFunction plot)
+{
+	_ForEachArea(rect, [&](const IntRect& area) {
 		for (int32 y = area.top; y <= area.bottom; y++) {
 			for (int32 x = area.left; x <= area.right; x++)
 				plot(fSurface.PixelAt(x, y), x, y);
 		}
-	}
+	});
 }
 
 void Painter::_Plot(uint8* pixel, rgb_color color, bool high)
@@ -165,16 +173,12 @@ void Painter::_Fill(const IntRect& rect, const pattern& p)
 		WritePixel(encoded, fSurface.space, solidHigh ? fState.high : fState.low);
 		uint32 value;
 		memcpy(&value, encoded, 4);
-		for (const IntRect& clip : fClip.Rects()) {
-			IntRect area = rect & clip & fSurface.Bounds();
-			if (!area.IsValid())
-				continue;
-			fTouched = fTouched | area;
+		_ForEachArea(rect, [&](const IntRect& area) {
 			for (int32 y = area.top; y <= area.bottom; y++) {
 				uint32* row = reinterpret_cast<uint32*>(fSurface.PixelAt(area.left, y));
 				std::fill(row, row + area.Width(), value);
 			}
-		}
+		});
 		return;
 	}
 

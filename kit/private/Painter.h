@@ -53,6 +53,9 @@ public:
 private:
 	IntRect _DeviceRect(BRect rect) const;
 	int32 _PenWidth() const;
+	// Calls draw with each part of rect that may be drawn.
+	template <typename AreaFunction>
+	void _ForEachArea(const IntRect& rect, AreaFunction draw);
 	template <typename PlotFunction>
 	void _ForEachPixel(const IntRect& rect, PlotFunction plot);
 	void _Fill(const IntRect& rect, const pattern& p);

@@ -124,19 +124,22 @@ protected:
 	static std::string Row(const BWindow* window, int32 y, int32 x0, int32 x1,
 		rgb_color ink = kBlack)
 	{
-		std::string row;
-		for (int32 x = x0; x <= x1; x++)
-			row += Pixel(window, x, y) == ink ? '#' : '.';
-		return row;
+		return Line(window, x0, y, 1, 0, x1 - x0 + 1, ink);
 	}
 
 	static std::string Column(const BWindow* window, int32 x, int32 y0, int32 y1,
 		rgb_color ink = kBlack)
 	{
-		std::string column;
-		for (int32 y = y0; y <= y1; y++)
-			column += Pixel(window, x, y) == ink ? '#' : '.';
-		return column;
+		return Line(window, x, y0, 0, 1, y1 - y0 + 1, ink);
+	}
+
+	static std::string Line(const BWindow* window, int32 x, int32 y, int32 dx, int32 dy,
+		int32 count, rgb_color ink)
+	{
+		std::string line;
+		for (int32 i = 0; i < count; i++)
+			line += Pixel(window, x + i * dx, y + i * dy) == ink ? '#' : '.';
+		return line;
 	}
 
 	std::vector<BWindow*> fWindows;

@@ -40,6 +40,13 @@ public:
 	{
 		_Record(std::string("key ") + std::string(bytes, numBytes), B_ORIGIN);
 	}
+	void MessageReceived(BMessage* message) override
+	{
+		if (message->what == B_MOUSE_WHEEL_CHANGED)
+			_Record("wheel", B_ORIGIN);
+		else
+			BView::MessageReceived(message);
+	}
 
 	struct Event {
 		std::string what;
@@ -117,6 +124,25 @@ TEST_F(InputTest, APressedViewKeepsThePointerUntilRelease)
 	EXPECT_EQ(left->events[3].where, BPoint(70, 10));
 	ASSERT_EQ(right->events.size(), 1u);
 	EXPECT_EQ(right->events[0].what, "entered");
+}
+
+TEST_F(InputTest, WheelAndGetMouseFollowThePointer)
+{
+	PostMouse(window, B_MOUSE_MOVED, BPoint(70, 10), B_TERTIARY_MOUSE_BUTTON);
+	BPrivate::Headless::PostWheel(window, 0, 2);
+	Idle();
+	ASSERT_EQ(right->events.size(), 2u);
+	EXPECT_EQ(right->events[1].what, "wheel");
+	EXPECT_EQ(right->events[1].message.GetFloat("be:wheel_delta_y", 0), 2);
+	EXPECT_TRUE(left->events.empty());
+
+	BPoint where;
+	uint32 buttons;
+	window->Lock();
+	right->GetMouse(&where, &buttons);
+	window->Unlock();
+	EXPECT_EQ(where, BPoint(20, 10));
+	EXPECT_EQ(buttons, uint32(B_TERTIARY_MOUSE_BUTTON));
 }
 
 TEST_F(InputTest, KeysGoToTheFocusViewOrToTheShortcutHandler)
