@@ -9,6 +9,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include "GioLock.h"
 #include "TypeIcons.h"
 
 namespace BPrivate {
@@ -83,6 +84,7 @@ bool IsFolder(const std::string& path)
 IconTheme::IconTheme()
 	: fBaseFolders(BaseFolders())
 {
+	std::lock_guard<std::mutex> lock(GioLock());
 	// Depth first along Inherits, each theme once; hicolor always comes last.
 	std::vector<std::string> pending{kDefaultTheme, kFallbackTheme};
 	while (!pending.empty()) {

@@ -8,6 +8,7 @@
 
 #include <StorageDefs.h>
 
+#include "GioLock.h"
 #include "MimeDatabase.h"
 
 namespace BPrivate {
@@ -51,6 +52,16 @@ struct GUnref {
 	void operator()(void* object) const { g_object_unref(object); }
 };
 
+std::string Guess(const char* name, const guchar* data, size_t size,
+	bool* uncertain)
+{
+	std::lock_guard<std::mutex> lock(GioLock());
+	gboolean unsure = FALSE;
+	GString guess(g_content_type_guess(name, data, size, &unsure));
+	*uncertain = unsure;
+	return guess.get();
+}
+
 // GIO describes a type it does not know by wrapping the type's name in a
 // (translated) phrase; the phrase is found once with a name no database has.
 bool IsMadeUpDescription(const std::string& type,
@@ -77,6 +88,12 @@ bool IsMadeUpDescription(const std::string& type,
 
 }
 
+std::mutex& GioLock()
+{
+	static std::mutex sLock;
+	return sLock;
+}
+
 std::string NormalizedMimeType(const char* type)
 {
 	std::string normalized(type);
@@ -90,15 +107,15 @@ std::string NormalizedMimeType(const char* type)
 std::string GuessMimeType(const char* name,
 	const std::function<ssize_t(void* buffer, size_t size)>& readHead)
 {
-	gboolean uncertain = FALSE;
-	GString guess(g_content_type_guess(name, nullptr, 0, &uncertain));
+	bool uncertain;
+	std::string guess = Guess(name, nullptr, 0, &uncertain);
 	if (uncertain) {
 		guchar head[4096];
 		ssize_t length = readHead(head, sizeof(head));
 		if (length >= 0)
-			guess.reset(g_content_type_guess(name, head, length, nullptr));
+			guess = Guess(name, head, length, &uncertain);
 	}
-	return guess.get();
+	return guess;
 }
 
 status_t GetMimeDescription(const std::string& type, bool shortForm,
@@ -109,6 +126,7 @@ status_t GetMimeDescription(const std::string& type, bool shortForm,
 		return B_OK;
 	}
 
+	std::lock_guard<std::mutex> lock(GioLock());
 	GString text(g_content_type_get_description(type.c_str()));
 	if (text == nullptr || IsMadeUpDescription(type, text.get()))
 		return B_ENTRY_NOT_FOUND;
@@ -125,6 +143,7 @@ std::vector<std::string> MimeIconNames(const std::string& type)
 		return {kitType->iconName};
 
 	std::vector<std::string> names;
+	std::lock_guard<std::mutex> lock(GioLock());
 	std::unique_ptr<GIcon, GUnref> icon(g_content_type_get_icon(type.c_str()));
 	if (icon != nullptr && G_IS_THEMED_ICON(icon.get())) {
 		// Symbolic icons are monochrome outlines, not file icons.
@@ -141,6 +160,7 @@ std::vector<std::string> MimeIconNames(const std::string& type)
 status_t GetMimePreferredApp(const std::string& type, std::string* appId)
 {
 	const KitType* kitType = FindKitType(type);
+	std::lock_guard<std::mutex> lock(GioLock());
 	std::unique_ptr<GAppInfo, GUnref> app(g_app_info_get_default_for_type(
 		kitType != nullptr ? kitType->systemType : type.c_str(), FALSE));
 	if (app == nullptr)
