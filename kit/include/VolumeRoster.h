@@ -8,9 +8,9 @@ class BVolume;
 
 // The mounted volumes, and a watch on mounts and unmounts. A watcher gets
 // B_NODE_MONITOR messages: "opcode" B_DEVICE_MOUNTED with "new device" (the
-// new volume), "device" and "directory" (where it was mounted), or "opcode"
-// B_DEVICE_UNMOUNTED with "device", all int32 but "directory" (int64). The
-// watch lasts until StopWatching or the roster's destruction.
+// new volume), or "opcode" B_DEVICE_UNMOUNTED with "device", all int32. They
+// are sent from the thread that noticed the change. The watch lasts until
+// StopWatching or the roster's destruction.
 class BVolumeRoster {
 public:
 	BVolumeRoster();

@@ -25,10 +25,12 @@
 // "removable", "shared", "attr" and "boot" ("-" for none), NAME the volume
 // name and ROOT its root folder; a space, tab, newline or backslash inside a
 // field is written \040, \011, \012 or \134, as in mountinfo. Empty lines and
-// lines starting with "#" are skipped. The "boot" volume (else the first) is
-// the boot volume; paths outside every listed root count as on the boot
-// volume. The file is read again whenever it changes, and watchers hear of
-// the volumes that came and went as of real mounts.
+// lines starting with "#" are skipped, and so are lines whose root does not
+// exist. The "boot" volume (else the first) is the boot volume; paths outside
+// every listed root count as on the boot volume. The file is read again
+// whenever it changes, and watchers hear of the volumes that came and went
+// as of real mounts; write a new table beside it and rename it over the old
+// one, so that it is never read half-written.
 enum {
 	B_FS_IS_READONLY = 0x00000001,
 	B_FS_IS_REMOVABLE = 0x00000002,

@@ -171,23 +171,23 @@ status_t BDirectory::_Open(status_t status)
 	if (status != B_OK)
 		return status;
 	struct stat st;
-	std::string path;
 	if (fstat(_FileDescriptor(), &st) != 0)
-		status = StatusFromErrno();
-	else
-		status = _GetPath(&path);
-	if (status == B_OK) {
-		fIterator = OpenIterator(_FileDescriptor());
-		if (fIterator == nullptr)
-			status = StatusFromErrno();
-	}
+		return _Fail(StatusFromErrno());
+	fIterator = OpenIterator(_FileDescriptor());
+	if (fIterator == nullptr)
+		return _Fail(StatusFromErrno());
+	fIterator->node = st.st_ino;
+
+	BPrivate::DirectoryRegistry& registry
+		= BPrivate::DirectoryRegistry::Default();
+	std::shared_lock<std::shared_mutex> noMoves(registry.MoveLock());
+	std::string path;
+	status = _GetPath(&path);
 	if (status != B_OK) {
 		fIterator.reset();
 		return _Fail(status);
 	}
-	fIterator->node = st.st_ino;
-	BPrivate::DirectoryRegistry::Default().Register(_Device(), st.st_ino,
-		st.st_dev, path);
+	registry.Register(_Device(), st.st_ino, st.st_dev, path);
 	return B_OK;
 }
 

@@ -39,6 +39,7 @@ void DirectoryRegistry::Register(dev_t device, ino_t node, dev_t systemDevice,
 status_t DirectoryRegistry::Resolve(dev_t device, ino_t node,
 	std::string* path)
 {
+	std::shared_lock<std::shared_mutex> noMoves(fMoveLock);
 	Location location;
 	bool known = false;
 	{

@@ -3,6 +3,7 @@
 
 #include <map>
 #include <mutex>
+#include <shared_mutex>
 #include <string>
 
 #include <SupportDefs.h>
@@ -17,10 +18,17 @@ class DirectoryRegistry {
 public:
 	static DirectoryRegistry& Default();
 
+	// Held shared while a folder's path is looked up and registered, and
+	// exclusively while the kit moves a folder and then its registered
+	// paths, so that no one records or resolves a path a move has just
+	// left behind.
+	std::shared_mutex& MoveLock() { return fMoveLock; }
+
 	// systemDevice is the folder's own st_dev, checked on use.
 	void Register(dev_t device, ino_t node, dev_t systemDevice,
 		const std::string& path);
 	// B_ENTRY_NOT_FOUND when the folder is unknown or no longer there.
+	// Takes the move lock itself.
 	status_t Resolve(dev_t device, ino_t node, std::string* path);
 	// A folder (and so everything below it) now lies at to.
 	void Moved(const std::string& from, const std::string& to);
@@ -32,6 +40,7 @@ private:
 		dev_t systemDevice;
 	};
 
+	std::shared_mutex fMoveLock;
 	std::mutex fLock;
 	std::map<std::pair<dev_t, ino_t>, Location> fFolders;
 };

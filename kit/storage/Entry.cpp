@@ -110,11 +110,7 @@ status_t BEntry::SetTo(const entry_ref* ref, bool traverse)
 status_t BEntry::SetTo(const char* path, bool traverse)
 {
 	Unset();
-	EntryPath entry;
-	status_t status = BPrivate::CanonicalEntry(path, traverse, &entry);
-	if (status == B_OK)
-		status = BPrivate::RefForEntry(entry, &fRef);
-	return fCStatus = status;
+	return fCStatus = BPrivate::RefForPath(path, traverse, &fRef);
 }
 
 void BEntry::Unset()
@@ -217,11 +213,7 @@ status_t get_ref_for_path(const char* path, entry_ref* ref)
 {
 	if (ref == nullptr)
 		return B_BAD_VALUE;
-	EntryPath entry;
-	status_t status = BPrivate::CanonicalEntry(path, false, &entry);
-	if (status != B_OK)
-		return status;
-	return BPrivate::RefForEntry(entry, ref);
+	return BPrivate::RefForPath(path, false, ref);
 }
 
 bool operator<(const entry_ref& a, const entry_ref& b)

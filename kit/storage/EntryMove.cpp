@@ -152,13 +152,18 @@ status_t BEntry::_MoveTo(const char* dirPath, dev_t dirDevice, ino_t dirNode,
 	status = trash.Prepare(source, dirPath, name, clobber);
 	if (status != B_OK)
 		return status;
-	status = RenamePath(from, to, isFolder, clobber);
+	{
+		BPrivate::DirectoryRegistry& registry
+			= BPrivate::DirectoryRegistry::Default();
+		std::unique_lock<std::shared_mutex> moving(registry.MoveLock());
+		status = RenamePath(from, to, isFolder, clobber);
+		if (status == B_OK && isFolder)
+			registry.Moved(from, to);
+	}
 	trash.Finish(status == B_OK);
 	if (status != B_OK)
 		return status;
 
-	if (isFolder)
-		BPrivate::DirectoryRegistry::Default().Moved(from, to);
 	fRef.device = dirDevice;
 	fRef.directory = dirNode;
 	return fRef.set_name(name);

@@ -141,16 +141,21 @@ status_t CanonicalEntry(const char* path, bool traverse, EntryPath* entry)
 	return B_OK;
 }
 
-status_t RefForEntry(const EntryPath& entry, entry_ref* ref)
+status_t RefForPath(const char* path, bool traverse, entry_ref* ref)
 {
+	DirectoryRegistry& registry = DirectoryRegistry::Default();
+	std::shared_lock<std::shared_mutex> noMoves(registry.MoveLock());
+	EntryPath entry;
+	status_t status = CanonicalEntry(path, traverse, &entry);
+	if (status != B_OK)
+		return status;
 	struct stat st;
 	if (lstat(entry.folder.c_str(), &st) != 0)
 		return StatusFromErrno();
 	if (!S_ISDIR(st.st_mode))
 		return B_NOT_A_DIRECTORY;
 	dev_t device = VolumeTable::Default().DeviceFor(entry.folder);
-	DirectoryRegistry::Default().Register(device, st.st_ino, st.st_dev,
-		entry.folder);
+	registry.Register(device, st.st_ino, st.st_dev, entry.folder);
 	ref->device = device;
 	ref->directory = st.st_ino;
 	return ref->set_name(entry.leaf.c_str());
@@ -198,7 +203,8 @@ status_t ApplyStat(int fd, const char* path, const struct stat& st,
 			times[0] = st.st_atim;
 		if ((what & B_STAT_MODIFICATION_TIME) != 0)
 			times[1] = st.st_mtim;
-		if (utimensat(at, path, times, noFollow) != 0)
+		if ((path != nullptr ? utimensat(at, path, times, noFollow)
+				: futimens(fd, times)) != 0)
 			return StatusFromErrno();
 	}
 	return B_OK;

@@ -27,8 +27,9 @@ status_t CanonicalEntry(const char* path, bool traverse, EntryPath* entry);
 // The path of an existing node, its links resolved.
 status_t CanonicalPath(const char* path, std::string* canonical);
 
-// The ref of an entry; the folder is registered so that the ref resolves.
-status_t RefForEntry(const EntryPath& entry, entry_ref* ref);
+// The ref of the entry at path (see CanonicalEntry); its folder is
+// registered so that the ref resolves.
+status_t RefForPath(const char* path, bool traverse, entry_ref* ref);
 // The entry a ref names.
 status_t EntryForRef(const entry_ref& ref, EntryPath* entry);
 

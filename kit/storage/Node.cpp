@@ -35,10 +35,12 @@ status_t PathOfDescriptor(int fd, std::string* path)
 	if (length == sizeof(buffer))
 		return B_NAME_TOO_LONG;
 	path->assign(buffer, length);
-	// A removed node reads as "PATH (deleted)", a path that is not there.
+	// A removed node reads as "PATH (deleted)"; it has no links left.
 	struct stat st;
-	if (path->empty() || (*path)[0] != '/' || lstat(path->c_str(), &st) != 0)
+	if (path->empty() || (*path)[0] != '/' || fstat(fd, &st) != 0
+		|| st.st_nlink == 0) {
 		return B_ENTRY_NOT_FOUND;
+	}
 	return B_OK;
 }
 

@@ -74,6 +74,9 @@ TEST(EntryTest, RefsCompareAcrossWaysOfGettingThem)
 	entry_ref back;
 	ASSERT_EQ(B_OK, entry.GetRef(&back));
 	EXPECT_EQ(byPath, back);
+	BDirectory parentDir;
+	ASSERT_EQ(B_OK, entry.GetParent(&parentDir));
+	EXPECT_TRUE(parentDir == dir);
 
 	// A missing leaf still has a ref; a missing folder has none.
 	entry_ref missing;
@@ -82,6 +85,14 @@ TEST(EntryTest, RefsCompareAcrossWaysOfGettingThem)
 	EXPECT_FALSE(BEntry(&missing).Exists());
 	EXPECT_EQ(B_ENTRY_NOT_FOUND,
 		get_ref_for_path((scratch / "none/x").c_str(), &missing));
+
+	// A ref's name never leads out of its folder.
+	for (const char* name : { "../dir", "a/b", "..", "" }) {
+		entry_ref bad(byPath.device, byPath.directory, name);
+		EXPECT_EQ(B_BAD_VALUE, BEntry(&bad).InitCheck()) << name;
+	}
+	entry_ref unknown(byPath.device, 1, "x");
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, BEntry(&unknown).InitCheck());
 
 	entry_ref root;
 	ASSERT_EQ(B_OK, get_ref_for_path("/", &root));
@@ -242,6 +253,8 @@ TEST(EntryTest, RemoveAndVanishedEntries)
 
 TEST(EntryTest, PermissionDeniedIsReported)
 {
+	// The kit may run threads of its own by now: the child starts afresh.
+	GTEST_FLAG_SET(death_test_style, "threadsafe");
 	Scratch scratch;
 	std::string closed = scratch.Folder("closed");
 	scratch.File("closed/secret", "s");
@@ -262,4 +275,30 @@ TEST(EntryTest, PermissionDeniedIsReported)
 			&& entry.Rename("open") == B_PERMISSION_DENIED;
 		_exit(denied ? 0 : 1);
 	}, ::testing::ExitedWithCode(0), "");
+}
+
+TEST(EntryTest, StatChangesReachTheEntryOrItsNode)
+{
+	Scratch scratch;
+	std::string path = scratch.File("file");
+	BEntry entry(path.c_str());
+	ASSERT_EQ(B_OK, entry.SetPermissions(0640));
+	ASSERT_EQ(B_OK, entry.SetModificationTime(1000000000));
+	BNode node(path.c_str());
+	mode_t mode;
+	time_t modified;
+	ASSERT_EQ(B_OK, node.GetPermissions(&mode));
+	EXPECT_EQ(0640u, mode);
+	ASSERT_EQ(B_OK, node.GetModificationTime(&modified));
+	EXPECT_EQ(1000000000, modified);
+	ASSERT_EQ(B_OK, node.SetAccessTime(2000000000));
+	time_t accessed;
+	ASSERT_EQ(B_OK, entry.GetAccessTime(&accessed));
+	EXPECT_EQ(2000000000, accessed);
+
+	// A link's own mode cannot change on Linux; its target is not touched.
+	ASSERT_EQ(0, symlink("file", (scratch / "link").c_str()));
+	EXPECT_NE(B_OK, BEntry((scratch / "link").c_str()).SetPermissions(0600));
+	ASSERT_EQ(B_OK, node.GetPermissions(&mode));
+	EXPECT_EQ(0640u, mode);
 }

@@ -168,3 +168,25 @@ TEST(TrashTest, ClashesAndFailuresLeaveNoStrayRecord)
 	BDirectory info(trash.info.c_str());
 	EXPECT_EQ(2, info.CountEntries());
 }
+
+TEST(FindDirectoryTest, UserFoldersFollowTheXdgSettings)
+{
+	PrivateHome home;
+	BPath path;
+	ASSERT_EQ(B_OK, find_directory(B_DESKTOP_DIRECTORY, &path));
+	EXPECT_EQ(home.Home() + "/Desktop", path.Path());
+	home.Root().File("home/.config/user-dirs.dirs",
+		"# written by xdg-user-dirs-update\n"
+		"XDG_DOCUMENTS_DIR=\"$HOME/Docs\"\n"
+		"XDG_DESKTOP_DIR=\"$HOME/Schreib \\\"tisch\\\"\"\n");
+	ASSERT_EQ(B_OK, find_directory(B_DESKTOP_DIRECTORY, &path, true));
+	EXPECT_EQ(home.Home() + "/Schreib \"tisch\"", path.Path());
+	EXPECT_TRUE(Exists(path.Path()));
+
+	ASSERT_EQ(B_OK, find_directory(B_USER_DIRECTORY, &path));
+	EXPECT_EQ(home.Home(), path.Path());
+	ASSERT_EQ(B_OK, find_directory(B_USER_SETTINGS_DIRECTORY, &path));
+	EXPECT_EQ(home.Home() + "/.config", path.Path());
+	EXPECT_EQ(B_BAD_VALUE,
+		find_directory(static_cast<directory_which>(12345), &path));
+}
