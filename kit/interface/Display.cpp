@@ -55,7 +55,6 @@ Display::Display()
 		if (wantsSdl)
 			fprintf(stderr, "No display could be opened: running without one.\n");
 		fDriver = CreateHeadlessDriver();
-		fHeadless = true;
 	}
 }
 
@@ -84,17 +83,6 @@ std::shared_ptr<DisplayWindow> Display::Find(const BWindow* owner) const
 	std::lock_guard<std::mutex> guard(fLock);
 	for (const auto& window : fWindows) {
 		if (window->owner == owner)
-			return window;
-	}
-	return nullptr;
-}
-
-std::shared_ptr<DisplayWindow> Display::WindowAt(BPoint screenWhere) const
-{
-	std::lock_guard<std::mutex> guard(fLock);
-	for (const auto& window : fWindows) {
-		std::lock_guard<std::mutex> windowGuard(window->lock);
-		if (window->visible && window->frame.Contains(screenWhere))
 			return window;
 	}
 	return nullptr;

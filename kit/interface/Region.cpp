@@ -39,27 +39,12 @@ IntRect Region::Bounds() const
 	return bounds;
 }
 
-bool Region::Contains(int32 x, int32 y) const
-{
-	for (const IntRect& rect : fRects) {
-		if (rect.Contains(x, y))
-			return true;
-	}
-	return false;
-}
-
 void Region::Include(const IntRect& rect)
 {
 	if (!rect.IsValid())
 		return;
 	Exclude(rect);
 	fRects.push_back(rect);
-}
-
-void Region::Include(const Region& region)
-{
-	for (const IntRect& rect : region.fRects)
-		Include(rect);
 }
 
 void Region::Exclude(const IntRect& cut)
@@ -87,17 +72,6 @@ void Region::Exclude(const IntRect& cut)
 	fRects.swap(kept);
 }
 
-void Region::IntersectWith(const IntRect& clip)
-{
-	std::vector<IntRect> kept;
-	for (const IntRect& rect : fRects) {
-		IntRect common = rect & clip;
-		if (common.IsValid())
-			kept.push_back(common);
-	}
-	fRects.swap(kept);
-}
-
 void Region::IntersectWith(const Region& region)
 {
 	std::vector<IntRect> kept;
@@ -109,12 +83,6 @@ void Region::IntersectWith(const Region& region)
 		}
 	}
 	fRects.swap(kept);
-}
-
-void Region::OffsetBy(int32 dx, int32 dy)
-{
-	for (IntRect& rect : fRects)
-		rect = rect.OffsetByCopy(dx, dy);
 }
 
 }

@@ -42,7 +42,6 @@ class DisplayDriver {
 public:
 	virtual ~DisplayDriver() = default;
 
-	virtual const char* Name() const = 0;
 	virtual void CreateWindow(const std::shared_ptr<DisplayWindow>& window) = 0;
 	virtual void DestroyWindow(const std::shared_ptr<DisplayWindow>& window) = 0;
 	// Title, frame or visibility changed.
@@ -68,18 +67,15 @@ public:
 	static Display& Default();
 
 	DisplayDriver& Driver() { return *fDriver; }
-	bool IsHeadless() const { return fHeadless; }
 
 	void AddWindow(const std::shared_ptr<DisplayWindow>& window);
 	void RemoveWindow(const std::shared_ptr<DisplayWindow>& window);
 	// Front to back.
 	std::vector<std::shared_ptr<DisplayWindow>> Windows() const;
 	std::shared_ptr<DisplayWindow> Find(const BWindow* owner) const;
-	std::shared_ptr<DisplayWindow> WindowAt(BPoint screenWhere) const;
 	// Records that window became the active one: front of the list, and
 	// B_WINDOW_ACTIVATED to it and to the one that was active before.
 	void SetActiveWindow(const std::shared_ptr<DisplayWindow>& window);
-	void WindowGone(const DisplayWindow* window);
 
 	uint32 Modifiers() const;
 	void SetModifiers(uint32 modifiers);
@@ -101,7 +97,6 @@ private:
 	std::shared_ptr<DisplayWindow> _OpenMenu() const;
 
 	std::unique_ptr<DisplayDriver> fDriver;
-	bool fHeadless = false;
 
 	mutable std::mutex fLock;
 	std::vector<std::shared_ptr<DisplayWindow>> fWindows;

@@ -24,7 +24,6 @@ struct IntRect {
 	{
 		return x >= left && x <= right && y >= top && y <= bottom;
 	}
-	bool Intersects(const IntRect& other) const { return (*this & other).IsValid(); }
 	IntRect operator&(const IntRect& other) const;
 	// The smallest rectangle holding both; an invalid side is ignored.
 	IntRect operator|(const IntRect& other) const;
@@ -32,10 +31,6 @@ struct IntRect {
 	{
 		return left == other.left && top == other.top && right == other.right
 			&& bottom == other.bottom;
-	}
-	IntRect OffsetByCopy(int32 dx, int32 dy) const
-	{
-		return IntRect(left + dx, top + dy, right + dx, bottom + dy);
 	}
 	BRect ToBRect() const { return BRect(left, top, right, bottom); }
 };
@@ -53,15 +48,11 @@ public:
 	bool IsEmpty() const { return fRects.empty(); }
 	const std::vector<IntRect>& Rects() const { return fRects; }
 	IntRect Bounds() const;
-	bool Contains(int32 x, int32 y) const;
 
 	void MakeEmpty() { fRects.clear(); }
 	void Include(const IntRect& rect);
-	void Include(const Region& region);
 	void Exclude(const IntRect& rect);
-	void IntersectWith(const IntRect& rect);
 	void IntersectWith(const Region& region);
-	void OffsetBy(int32 dx, int32 dy);
 
 private:
 	std::vector<IntRect> fRects;

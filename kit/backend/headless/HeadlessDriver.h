@@ -11,7 +11,6 @@ namespace BPrivate {
 // and the one most recently shown or activated is the active one.
 class HeadlessDriver : public DisplayDriver {
 public:
-	const char* Name() const override { return "headless"; }
 	void CreateWindow(const std::shared_ptr<DisplayWindow>&) override {}
 	void DestroyWindow(const std::shared_ptr<DisplayWindow>&) override {}
 	void UpdateWindow(const std::shared_ptr<DisplayWindow>&) override {}

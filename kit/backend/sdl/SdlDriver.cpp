@@ -46,7 +46,6 @@ class SdlDriver : public DisplayDriver {
 public:
 	bool Init();
 
-	const char* Name() const override { return "sdl"; }
 	void CreateWindow(const std::shared_ptr<DisplayWindow>& window) override
 	{
 		_Request(Command::kCreate, window);
