@@ -45,24 +45,6 @@ int32 PixelSize(float extent)
 	return max_c(int32(1), BPrivate::PixelCoordinate(extent) + 1);
 }
 
-// Copies what the display must know of the window; the caller holds the
-// window's lock.
-void PublishState(const WindowData& data)
-{
-	if (data.display == nullptr)
-		return;
-	{
-		std::lock_guard<std::mutex> guard(data.display->lock);
-		data.display->frame = data.frame;
-		data.display->title = data.title;
-		data.display->look = data.look;
-		data.display->feel = data.feel;
-		data.display->flags = data.flags;
-		data.display->visible = data.hideLevel <= 0;
-	}
-	Display::Default().Driver().UpdateWindow(data.display);
-}
-
 // Gives the framebuffer the window's size; the views then redraw it all.
 void SizeFramebuffer(BWindow* window)
 {
@@ -81,6 +63,23 @@ void SizeFramebuffer(BWindow* window)
 }
 
 namespace BPrivate {
+
+void WindowAccess::Publish(BWindow* window)
+{
+	const WindowData& data = Data(window);
+	if (data.display == nullptr)
+		return;
+	{
+		std::lock_guard<std::mutex> guard(data.display->lock);
+		data.display->frame = data.frame;
+		data.display->title = data.title;
+		data.display->look = data.look;
+		data.display->feel = data.feel;
+		data.display->flags = data.flags;
+		data.display->visible = data.hideLevel <= 0;
+	}
+	Display::Default().Driver().UpdateWindow(data.display);
+}
 
 void WindowAccess::Resize(BWindow* window, float width, float height)
 {
@@ -228,13 +227,9 @@ void BWindow::Show()
 	}
 	WindowAccess::LayoutChanged(this);
 	WindowAccess::Invalidate(this, data.surface.Bounds());
-	{
-		std::lock_guard<std::mutex> guard(data.display->lock);
-		data.display->visible = true;
-	}
+	WindowAccess::Publish(this);
 	if (created)
 		display.Driver().CreateWindow(data.display);
-	PublishState(data);
 	if (Thread() < 0)
 		Run();
 	if ((data.flags & B_AVOID_FOCUS) == 0)
@@ -247,7 +242,7 @@ void BWindow::Hide()
 	if (++data.hideLevel != 1)
 		return;
 	WindowAccess::LayoutChanged(this);
-	PublishState(data);
+	WindowAccess::Publish(this);
 }
 
 bool BWindow::IsHidden() const
@@ -269,7 +264,7 @@ bool BWindow::IsActive() const
 void BWindow::SetTitle(const char* title)
 {
 	fWindowData->title = title != nullptr ? title : "";
-	PublishState(*fWindowData);
+	WindowAccess::Publish(this);
 }
 
 const char* BWindow::Title() const
@@ -313,7 +308,7 @@ void BWindow::MoveTo(BPoint where)
 	if (where == data.frame.LeftTop())
 		return;
 	data.frame.OffsetTo(where);
-	PublishState(data);
+	WindowAccess::Publish(this);
 	BMessage moved(B_WINDOW_MOVED);
 	moved.AddPoint("where", where);
 	PostMessage(&moved);
@@ -338,7 +333,7 @@ void BWindow::ResizeTo(float width, float height)
 		|| (width == data.frame.Width() && height == data.frame.Height()))
 		return;
 	WindowAccess::Resize(this, width, height);
-	PublishState(data);
+	WindowAccess::Publish(this);
 	BMessage resized(B_WINDOW_RESIZED);
 	resized.AddFloat("width", width);
 	resized.AddFloat("height", height);

@@ -38,14 +38,20 @@ void DeliverMouse(BWindow* window, BMessage* message)
 	if (message->what == B_MOUSE_DOWN && data.mouseView == nullptr)
 		data.mouseView = under;
 	BView* target = data.mouseView != nullptr ? data.mouseView : under;
-	if (target == nullptr)
+	std::shared_ptr<BPrivate::DragSession> drag = BPrivate::CurrentDragSession();
+	const BMessage* dragMessage = drag != nullptr ? drag->Message() : nullptr;
+	if (target == nullptr) {
+		// The pointer left the window.
+		BView* last = data.lastMouseView;
+		data.lastMouseView = nullptr;
+		if (message->what == B_MOUSE_MOVED && last != nullptr)
+			last->MouseMoved(ToView(last, where), B_EXITED_VIEW, dragMessage);
 		return;
+	}
 
 	BPoint local = ToView(target, where);
 	SetPointField(message, "where", local);
 	SetPointField(message, "be:view_where", local);
-	std::shared_ptr<BPrivate::DragSession> drag = BPrivate::CurrentDragSession();
-	const BMessage* dragMessage = drag != nullptr ? drag->Message() : nullptr;
 
 	switch (message->what) {
 		case B_MOUSE_DOWN:
@@ -168,6 +174,7 @@ bool DispatchToWindow(BWindow* window, BMessage* message)
 			BPoint where;
 			if (message->FindPoint("where", &where) == B_OK) {
 				data.frame.OffsetTo(where);
+				WindowAccess::Publish(window);
 				window->FrameMoved(where);
 			}
 			return true;
@@ -177,6 +184,7 @@ bool DispatchToWindow(BWindow* window, BMessage* message)
 			float width = message->GetFloat("width", data.frame.Width());
 			float height = message->GetFloat("height", data.frame.Height());
 			WindowAccess::Resize(window, width, height);
+			WindowAccess::Publish(window);
 			window->FrameResized(width, height);
 			return true;
 		}

@@ -79,6 +79,8 @@ public:
 	// they reach the screen.
 	static void Drawn(BWindow* window, const IntRect& touched);
 	static void LayoutChanged(BWindow* window) { Data(window).layoutStamp++; }
+	// Tells the display the window's title, frame, look and visibility.
+	static void Publish(BWindow* window);
 	// Gives the window a new size (the views follow) without telling the
 	// display.
 	static void Resize(BWindow* window, float width, float height);
