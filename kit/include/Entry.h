@@ -8,6 +8,10 @@
 class BDirectory;
 class BPath;
 
+namespace BPrivate {
+struct EntryPath;
+}
+
 // A reference to a file-system entry: the device, the node of the folder it
 // is in, and its name. Two refs are equal when those three are.
 //
@@ -85,6 +89,8 @@ public:
 
 private:
 	virtual status_t _SetStat(const struct stat& st, uint32 what);
+	// Where the entry lies now.
+	status_t _Resolve(BPrivate::EntryPath* entry) const;
 	status_t _MoveTo(const char* dirPath, dev_t dirDevice, ino_t dirNode,
 		const char* name, bool clobber);
 

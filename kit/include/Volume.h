@@ -41,6 +41,7 @@ public:
 	BVolume& operator=(const BVolume& volume);
 
 private:
+	status_t _GetInfo(struct fs_info* info) const;
 	bool _HasFlag(uint32 flag) const;
 
 	dev_t fDevice;

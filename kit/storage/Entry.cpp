@@ -60,12 +60,10 @@ bool BEntry::Exists() const
 
 status_t BEntry::GetStat(struct stat* st) const
 {
-	if (fCStatus != B_OK)
-		return fCStatus;
 	if (st == nullptr)
 		return B_BAD_VALUE;
 	EntryPath entry;
-	status_t status = BPrivate::EntryForRef(fRef, &entry);
+	status_t status = _Resolve(&entry);
 	if (status != B_OK)
 		return status;
 	std::string path = entry.Path();
@@ -131,12 +129,10 @@ status_t BEntry::GetRef(entry_ref* ref) const
 
 status_t BEntry::GetPath(BPath* path) const
 {
-	if (fCStatus != B_OK)
-		return fCStatus;
 	if (path == nullptr)
 		return B_BAD_VALUE;
 	EntryPath entry;
-	status_t status = BPrivate::EntryForRef(fRef, &entry);
+	status_t status = _Resolve(&entry);
 	if (status != B_OK)
 		return status;
 	return path->SetTo(entry.Path().c_str());
@@ -144,12 +140,10 @@ status_t BEntry::GetPath(BPath* path) const
 
 status_t BEntry::GetParent(BEntry* entry) const
 {
-	if (fCStatus != B_OK)
-		return fCStatus;
 	if (entry == nullptr)
 		return B_BAD_VALUE;
 	EntryPath self;
-	status_t status = BPrivate::EntryForRef(fRef, &self);
+	status_t status = _Resolve(&self);
 	if (status != B_OK)
 		return status;
 	// The root has no parent.
@@ -200,13 +194,18 @@ BEntry& BEntry::operator=(const BEntry& item)
 
 status_t BEntry::_SetStat(const struct stat& st, uint32 what)
 {
-	if (fCStatus != B_OK)
-		return fCStatus;
 	EntryPath entry;
-	status_t status = BPrivate::EntryForRef(fRef, &entry);
+	status_t status = _Resolve(&entry);
 	if (status != B_OK)
 		return status;
 	return BPrivate::ApplyStat(-1, entry.Path().c_str(), st, what);
+}
+
+status_t BEntry::_Resolve(EntryPath* entry) const
+{
+	if (fCStatus != B_OK)
+		return fCStatus;
+	return BPrivate::EntryForRef(fRef, entry);
 }
 
 status_t get_ref_for_path(const char* path, entry_ref* ref)

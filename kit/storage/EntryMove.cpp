@@ -101,10 +101,8 @@ status_t FolderOf(const BDirectory* dir, std::string* path, dev_t* device,
 
 status_t BEntry::Rename(const char* path, bool clobber)
 {
-	if (fCStatus != B_OK)
-		return fCStatus;
 	EntryPath entry;
-	status_t status = BPrivate::EntryForRef(fRef, &entry);
+	status_t status = _Resolve(&entry);
 	if (status != B_OK)
 		return status;
 	return _MoveTo(entry.folder.c_str(), fRef.device, fRef.directory, path,
@@ -132,7 +130,7 @@ status_t BEntry::_MoveTo(const char* dirPath, dev_t dirDevice, ino_t dirNode,
 	if (status != B_OK)
 		return status;
 	EntryPath source;
-	status = BPrivate::EntryForRef(fRef, &source);
+	status = _Resolve(&source);
 	if (status != B_OK)
 		return status;
 	struct stat st;
@@ -171,10 +169,8 @@ status_t BEntry::_MoveTo(const char* dirPath, dev_t dirDevice, ino_t dirNode,
 
 status_t BEntry::Remove()
 {
-	if (fCStatus != B_OK)
-		return fCStatus;
 	EntryPath entry;
-	status_t status = BPrivate::EntryForRef(fRef, &entry);
+	status_t status = _Resolve(&entry);
 	if (status != B_OK)
 		return status;
 	if (entry.leaf == ".")

@@ -1,17 +1,17 @@
 #include "TrashRecords.h"
 
+#include <algorithm>
 #include <atomic>
 #include <cerrno>
-#include <cstdlib>
 #include <ctime>
-#include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include <Directory.h>
+#include <StorageDefs.h>
+#include <File.h>
 
 #include "EntryPath.h"
-#include "ErrnoStatus.h"
 #include "UserFolders.h"
 
 namespace BPrivate {
@@ -64,42 +64,36 @@ bool TrashFolders(std::string* files, std::string* info)
 
 std::string ReadRecord(const std::string& path)
 {
-	std::string contents;
-	int fd = open(path.c_str(), O_RDONLY | O_CLOEXEC);
-	if (fd < 0)
-		return contents;
-	char buffer[4096];
-	ssize_t length;
-	while ((length = read(fd, buffer, sizeof(buffer))) > 0)
-		contents.append(buffer, length);
-	close(fd);
+	BFile file(path.c_str(), B_READ_ONLY);
+	off_t size;
+	// A record is a few lines; anything else is not one.
+	if (file.GetSize(&size) != B_OK || size > 65536)
+		return "";
+	std::string contents(size, '\0');
+	ssize_t length = file.Read(contents.data(), size);
+	contents.resize(std::max<ssize_t>(length, 0));
 	return contents;
-}
-
-status_t WriteAll(int fd, const std::string& contents)
-{
-	size_t done = 0;
-	while (done < contents.size()) {
-		ssize_t length = write(fd, contents.data() + done,
-			contents.size() - done);
-		if (length < 0 && errno != EINTR)
-			return StatusFromErrno();
-		if (length > 0)
-			done += length;
-	}
-	return fsync(fd) == 0 ? B_OK : StatusFromErrno();
 }
 
 // Creates path with O_EXCL holding contents; nothing is left behind when
 // that fails part-way.
 status_t CreateRecord(const std::string& path, const std::string& contents)
 {
-	int fd = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
-	if (fd < 0)
-		return StatusFromErrno();
-	status_t status = WriteAll(fd, contents);
-	if (close(fd) != 0 && status == B_OK)
-		status = StatusFromErrno();
+	BFile file(path.c_str(), B_WRITE_ONLY | B_CREATE_FILE | B_FAIL_IF_EXISTS);
+	status_t status = file.InitCheck();
+	if (status != B_OK)
+		return status;
+	// As private as the records gio writes.
+	status = file.SetPermissions(0600);
+	if (status == B_OK) {
+		ssize_t written = file.Write(contents.data(), contents.size());
+		if (written < 0)
+			status = written;
+		else if (static_cast<size_t>(written) < contents.size())
+			status = B_DEVICE_FULL;
+		else
+			status = file.Sync();
+	}
 	if (status != B_OK)
 		unlink(path.c_str());
 	return status;
@@ -139,11 +133,16 @@ status_t TrashMove::Prepare(const EntryPath& source,
 	if (targetFolder != files)
 		return B_OK;
 
-	// Renamed inside the trash, an entry keeps where it came from.
-	std::string contents = leaving ? ReadRecord(fOldRecord) : "";
+	std::string recordName = targetName + kRecordSuffix;
+	if (recordName.size() >= B_FILE_NAME_LENGTH)
+		return B_NAME_TOO_LONG;
+	// Renamed inside the trash, an entry keeps where it came from, or
+	// stays without a record if it had none.
+	std::string contents = leaving ? ReadRecord(fOldRecord)
+		: RecordFor(source.Path());
 	if (contents.empty())
-		contents = RecordFor(source.Path());
-	fRecord = JoinPath(info, targetName + kRecordSuffix);
+		return B_OK;
+	fRecord = JoinPath(info, recordName);
 	if (clobber) {
 		// The record of what the move replaces stays until the move is done.
 		static std::atomic<int32> sCounter = 0;

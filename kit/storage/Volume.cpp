@@ -66,24 +66,29 @@ status_t BVolume::GetRootDirectory(BDirectory* directory) const
 	return directory->SetTo(volume.root.c_str());
 }
 
+status_t BVolume::_GetInfo(fs_info* info) const
+{
+	return fCStatus == B_OK ? fs_stat_dev(fDevice, info) : fCStatus;
+}
+
 off_t BVolume::Capacity() const
 {
 	fs_info info;
-	status_t status = fCStatus == B_OK ? fs_stat_dev(fDevice, &info) : fCStatus;
+	status_t status = _GetInfo(&info);
 	return status == B_OK ? info.block_size * info.total_blocks : status;
 }
 
 off_t BVolume::FreeBytes() const
 {
 	fs_info info;
-	status_t status = fCStatus == B_OK ? fs_stat_dev(fDevice, &info) : fCStatus;
+	status_t status = _GetInfo(&info);
 	return status == B_OK ? info.block_size * info.free_blocks : status;
 }
 
 off_t BVolume::BlockSize() const
 {
 	fs_info info;
-	status_t status = fCStatus == B_OK ? fs_stat_dev(fDevice, &info) : fCStatus;
+	status_t status = _GetInfo(&info);
 	return status == B_OK ? info.block_size : status;
 }
 
@@ -92,7 +97,7 @@ status_t BVolume::GetName(char* name) const
 	if (name == nullptr)
 		return B_BAD_VALUE;
 	fs_info info;
-	status_t status = fCStatus == B_OK ? fs_stat_dev(fDevice, &info) : fCStatus;
+	status_t status = _GetInfo(&info);
 	if (status == B_OK)
 		std::strcpy(name, info.volume_name);
 	return status;
@@ -101,8 +106,7 @@ status_t BVolume::GetName(char* name) const
 bool BVolume::_HasFlag(uint32 flag) const
 {
 	fs_info info;
-	return fCStatus == B_OK && fs_stat_dev(fDevice, &info) == B_OK
-		&& (info.flags & flag) != 0;
+	return _GetInfo(&info) == B_OK && (info.flags & flag) != 0;
 }
 
 bool BVolume::IsRemovable() const
