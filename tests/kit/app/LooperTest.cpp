@@ -202,9 +202,11 @@ TEST(Looper, DispatchHasTheLockTheThreadAndTheCurrentMessage)
 	ASSERT_NE(nullptr, kept);
 	EXPECT_TRUE(kept->WasDelivered());
 	EXPECT_STREQ("kept", kept->GetString("name"));
-	EXPECT_EQ(nullptr, looper->CurrentMessage());
 	EXPECT_EQ(nullptr, BLooper::LooperForThread(find_thread(NULL)));
-	QuitLooper(looper);
+	// Between dispatches there is no current message.
+	ASSERT_TRUE(looper->Lock());
+	EXPECT_EQ(nullptr, looper->CurrentMessage());
+	looper->Quit();
 }
 
 TEST(Looper, MessengersToDeletedTargetsFailInsteadOfCrashing)
