@@ -254,5 +254,7 @@ void BAlert::_Pressed(int32 index)
 		copy.AddInt32("which", index);
 		data.invoker->Invoke(&copy);
 	}
+	// Off the screen at once, no longer blocking the other windows.
+	Hide();
 	Quit();
 }

@@ -14,6 +14,7 @@ namespace BPrivate {
 namespace {
 
 constexpr uint32 kDragMoved = '_DMV';
+constexpr uint32 kDragEnded = '_DND';
 
 // Shows what is dragged: the bitmap, or the outline of a rectangle.
 class DragImageView : public BView {
@@ -48,20 +49,38 @@ private:
 class DragWindow : public BWindow {
 public:
 	DragWindow(BRect frame, BBitmap* bitmap, drawing_mode mode)
-		: BWindow(frame, "drag", B_NO_BORDER_WINDOW_LOOK, B_FLOATING_ALL_WINDOW_FEEL,
-			B_AVOID_FOCUS | B_NOT_MOVABLE | B_NOT_RESIZABLE | B_NOT_CLOSABLE)
+		:
+		BWindow(frame, "drag", B_NO_BORDER_WINDOW_LOOK, B_FLOATING_ALL_WINDOW_FEEL,
+			B_AVOID_FOCUS | B_NOT_MOVABLE | B_NOT_RESIZABLE | B_NOT_CLOSABLE),
+		fImage(new DragImageView(Bounds(), bitmap, mode))
 	{
-		AddChild(new DragImageView(Bounds(), bitmap, mode));
+		AddChild(fImage);
 	}
 
 	void MessageReceived(BMessage* message) override
 	{
 		BPoint where;
-		if (message->what == kDragMoved && message->FindPoint("where", &where) == B_OK)
-			MoveTo(where);
-		else
-			BWindow::MessageReceived(message);
+		switch (message->what) {
+			case kDragMoved:
+				if (message->FindPoint("where", &where) == B_OK)
+					MoveTo(where);
+				break;
+			case kDragEnded:
+				// Gone from the screen, and the bitmap freed, before the
+				// window itself goes.
+				Hide();
+				RemoveChild(fImage);
+				delete fImage;
+				Quit();
+				break;
+			default:
+				BWindow::MessageReceived(message);
+				break;
+		}
 	}
+
+private:
+	DragImageView* fImage;
 };
 
 class ViewDrag : public DragSession {
@@ -79,7 +98,7 @@ public:
 	~ViewDrag() override
 	{
 		// The image goes, and the bitmap with it.
-		fImageMessenger.SendMessage(B_QUIT_REQUESTED);
+		fImageMessenger.SendMessage(kDragEnded);
 	}
 
 	const BMessage* Message() const override { return &fMessage; }
