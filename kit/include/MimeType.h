@@ -28,7 +28,6 @@ public:
 	// NULL while not initialised.
 	const char* Type() const;
 	bool IsValid() const;
-	bool IsSupertypeOnly() const;
 
 	bool operator==(const BMimeType& type) const;
 	bool operator==(const char* type) const;

@@ -1,6 +1,7 @@
 // What the system's shared MIME database (through GIO) says about types,
 // and the platform's own folder, volume and link types.
 
+#include <algorithm>
 #include <cstring>
 #include <memory>
 
@@ -46,7 +47,7 @@ const KitType* FindKitType(const std::string& type)
 struct GFree {
 	void operator()(void* data) const { g_free(data); }
 };
-typedef std::unique_ptr<char, GFree> GString;
+typedef std::unique_ptr<char, GFree> GText;
 
 struct GUnref {
 	void operator()(void* object) const { g_object_unref(object); }
@@ -57,7 +58,7 @@ std::string Guess(const char* name, const guchar* data, size_t size,
 {
 	std::lock_guard<std::mutex> lock(GioLock());
 	gboolean unsure = FALSE;
-	GString guess(g_content_type_guess(name, data, size, &unsure));
+	GText guess(g_content_type_guess(name, data, size, &unsure));
 	*uncertain = unsure;
 	return guess.get();
 }
@@ -74,7 +75,7 @@ bool IsMadeUpDescription(const std::string& type,
 	};
 	static const Wrapping sWrapping = [] {
 		const std::string probe = "x-varnel-probe/x-never-registered";
-		GString text(g_content_type_get_description(probe.c_str()));
+		GText text(g_content_type_get_description(probe.c_str()));
 		std::string made = text ? text.get() : "";
 		size_t at = made.find(probe);
 		if (at == std::string::npos)
@@ -127,7 +128,7 @@ status_t GetMimeDescription(const std::string& type, bool shortForm,
 	}
 
 	std::lock_guard<std::mutex> lock(GioLock());
-	GString text(g_content_type_get_description(type.c_str()));
+	GText text(g_content_type_get_description(type.c_str()));
 	if (text == nullptr || IsMadeUpDescription(type, text.get()))
 		return B_ENTRY_NOT_FOUND;
 	*description = text.get();

@@ -54,11 +54,6 @@ bool BMimeType::IsValid() const
 	return fCStatus == B_OK;
 }
 
-bool BMimeType::IsSupertypeOnly() const
-{
-	return fCStatus == B_OK && strchr(fType, '/') == NULL;
-}
-
 bool BMimeType::operator==(const BMimeType& type) const
 {
 	return *this == type.Type();
