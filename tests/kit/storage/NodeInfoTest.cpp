@@ -1,12 +1,11 @@
 #include <gtest/gtest.h>
 
-#include <cstring>
+#include <algorithm>
 
 #include <sys/stat.h>
 #include <sys/xattr.h>
 #include <unistd.h>
 
-#include <Bitmap.h>
 #include <Entry.h>
 #include <Node.h>
 #include <NodeInfo.h>
@@ -20,7 +19,7 @@ using namespace TypeTest;
 
 namespace {
 
-const char kPngStart[] = "\x89PNG\r\n\x1a\n\0\0\0\rIHDR";
+const std::string kPngStart("\x89PNG\r\n\x1a\n\0\0\0\rIHDR", 16);
 
 std::string TypeOf(BNode&& node)
 {
@@ -36,43 +35,31 @@ std::string TypeAt(const std::string& path)
 
 std::vector<uint8> TrackerIcon(const std::string& path, icon_size size)
 {
-	BEntry entry(path.c_str());
 	entry_ref ref;
-	EXPECT_EQ(B_OK, entry.GetRef(&ref));
+	EXPECT_EQ(B_OK, BEntry(path.c_str()).GetRef(&ref));
 	BBitmap bitmap(BRect(0, 0, size - 1, size - 1), B_CMAP8);
 	EXPECT_EQ(B_OK, BNodeInfo::GetTrackerIcon(&ref, &bitmap, size));
-	const uint8* bits = static_cast<const uint8*>(bitmap.Bits());
-	return std::vector<uint8>(bits, bits + bitmap.BitsLength());
-}
-
-std::vector<uint8> TypeIcon(const char* type, icon_size size)
-{
-	BBitmap bitmap(BRect(0, 0, size - 1, size - 1), B_CMAP8);
-	EXPECT_EQ(B_OK, BMimeType(type).GetIcon(&bitmap, size));
-	const uint8* bits = static_cast<const uint8*>(bitmap.Bits());
-	return std::vector<uint8>(bits, bits + bitmap.BitsLength());
+	return Pixels(bitmap);
 }
 
 class NodeInfoTest : public testing::Test {
 protected:
-	IconEnvironment fEnvironment;
-	const TempFolder& fRoot = fEnvironment.Root();
+	IconEnvironment fTheme;
+	const Scratch& fRoot = fTheme.Root();
 };
 
 }
 
 TEST_F(NodeInfoTest, TypeComesFromTheNameThenTheContent)
 {
-	EXPECT_EQ("text/plain", TypeAt(fRoot.Write("notes.txt", "")));
-	EXPECT_EQ("image/png", TypeAt(fRoot.Write("picture",
-		std::string(kPngStart, sizeof(kPngStart) - 1))));
-	EXPECT_EQ("text/plain", TypeAt(fRoot.Write("letter", "plain words\n")));
+	EXPECT_EQ("text/plain", TypeAt(fRoot.File("notes.txt", "")));
+	EXPECT_EQ("image/png", TypeAt(fRoot.File("picture", kPngStart)));
+	EXPECT_EQ("text/plain", TypeAt(fRoot.File("letter", "plain words\n")));
 	// A name that says something is believed over the content.
-	EXPECT_EQ("text/plain", TypeAt(fRoot.Write("fake.txt",
-		std::string(kPngStart, sizeof(kPngStart) - 1))));
-	EXPECT_EQ("text/plain", TypeAt(fRoot.Write("it's $HOME `x`\n\"q\".txt",
-		"")));
-	EXPECT_EQ("text/plain", TypeAt(fRoot.Write("caf\xe9.txt", "")));
+	EXPECT_EQ("text/plain", TypeAt(fRoot.File("fake.txt", kPngStart)));
+	EXPECT_EQ("text/plain",
+		TypeAt(fRoot.File("it's $HOME `x`\n\"q\".txt", "")));
+	EXPECT_EQ("text/plain", TypeAt(fRoot.File("caf\xe9.txt", "")));
 
 	// Special files are never opened for reading.
 	std::string fifo = fRoot.Path() + "/pipe";
@@ -82,7 +69,7 @@ TEST_F(NodeInfoTest, TypeComesFromTheNameThenTheContent)
 
 TEST_F(NodeInfoTest, TypeAttributeWinsAndTravelsAsUserMimeType)
 {
-	std::string path = fRoot.Write("data.txt", "x");
+	std::string path = fRoot.File("data.txt", "x");
 	// As another program writes it.
 	ASSERT_EQ(0, setxattr(path.c_str(), "user.mime_type", "image/png", 9, 0));
 	EXPECT_EQ("image/png", TypeAt(path));
@@ -91,7 +78,8 @@ TEST_F(NodeInfoTest, TypeAttributeWinsAndTravelsAsUserMimeType)
 	BNodeInfo info(&node);
 	EXPECT_EQ(B_OK, info.SetType("application/x-Varnel"));
 	char raw[64];
-	ssize_t length = getxattr(path.c_str(), "user.mime_type", raw, sizeof(raw));
+	ssize_t length = getxattr(path.c_str(), "user.mime_type", raw,
+		sizeof(raw));
 	EXPECT_EQ("application/x-Varnel",
 		std::string(raw, std::max<ssize_t>(length, 0)));
 	EXPECT_EQ(B_BAD_VALUE, info.SetType("not a type"));
@@ -108,7 +96,7 @@ TEST_F(NodeInfoTest, TypeAttributeWinsAndTravelsAsUserMimeType)
 
 TEST_F(NodeInfoTest, FoldersLinksAndVolumes)
 {
-	std::string folder = fRoot.Make("folder/");
+	std::string folder = fRoot.Folder("folder");
 	std::string link = fRoot.Path() + "/link";
 	ASSERT_EQ(0, symlink("folder", link.c_str()));
 
@@ -130,15 +118,20 @@ TEST_F(NodeInfoTest, FoldersLinksAndVolumes)
 
 TEST_F(NodeInfoTest, TrackerIconsPreferTheNodesOwnThenItsType)
 {
-	WriteTheme(fRoot, "Adwaita");
-	WritePng(fRoot.Path() + "/icons/Adwaita/16x16/mimetypes/text-x-generic.png",
-		16, [](int32, int32) { return Rgba{0, 0, 255, 255}; });
-	std::string text = fRoot.Write("a.txt", "");
-	std::string own = fRoot.Write("b.txt", "");
-	std::string unknown = fRoot.Write("c.varnel-unknown", "\x01\x02");
+	fTheme.WriteTheme("Adwaita");
+	fTheme.WriteIcon("Adwaita/16x16/mimetypes/text-x-generic.png",
+		Png(16, Rgba{0, 0, 255, 255}));
+	std::string own = fRoot.File("own.txt", "");
+	std::string unknown = fRoot.File("c.varnel-unknown", "\x01\x02");
 
-	EXPECT_EQ(std::vector<uint8>(256, BPrivate::IndexForColor(0, 0, 255)),
-		TrackerIcon(text, B_MINI_ICON));
+	// Many files of one type decode one PNG.
+	int32 before = BPrivate::IconDecodeCount();
+	for (int i = 0; i < 100; i++) {
+		std::string file = fRoot.File("f" + std::to_string(i) + ".txt");
+		EXPECT_EQ(std::vector<uint8>(256, BPrivate::IndexForColor(0, 0, 255)),
+			TrackerIcon(file, B_MINI_ICON));
+	}
+	EXPECT_EQ(before + 1, BPrivate::IconDecodeCount());
 
 	BNode node(own.c_str());
 	BBitmap icon(BRect(0, 0, 15, 15), B_CMAP8);
@@ -147,41 +140,26 @@ TEST_F(NodeInfoTest, TrackerIconsPreferTheNodesOwnThenItsType)
 	ASSERT_EQ(256, node.WriteAttr("BEOS:M:STD_ICON", B_MINI_ICON_TYPE, 0,
 		pixels.data(), pixels.size()));
 	EXPECT_EQ(pixels, TrackerIcon(own, B_MINI_ICON));
-	// The large icon is not there: the type's (none here) or a plain file.
-	EXPECT_EQ(TrackerIcon(unknown, B_LARGE_ICON),
-		TrackerIcon(own, B_LARGE_ICON));
-
-	// Without a theme icon, the drawn file picture.
-	std::vector<uint8> plain = TrackerIcon(unknown, B_MINI_ICON);
-	EXPECT_NE(std::count(plain.begin(), plain.end(), B_TRANSPARENT_MAGIC_CMAP8),
-		256);
+	// No large icon of its own, none of its type: the drawn file picture.
+	std::vector<uint8> plain = TrackerIcon(own, B_LARGE_ICON);
+	EXPECT_EQ(plain, TrackerIcon(unknown, B_LARGE_ICON));
+	EXPECT_NE(1024, std::count(plain.begin(), plain.end(),
+		B_TRANSPARENT_MAGIC_CMAP8));
 	EXPECT_EQ(B_BAD_VALUE,
 		BNodeInfo(&node).GetTrackerIcon(&icon, B_LARGE_ICON));
 }
 
-TEST_F(NodeInfoTest, BrokenLinksShowAsLinks)
+TEST_F(NodeInfoTest, FoldersAndBrokenLinksGetTheirPictures)
 {
 	std::string link = fRoot.Path() + "/dangling";
 	ASSERT_EQ(0, symlink("nowhere", link.c_str()));
 	EXPECT_EQ(TypeIcon("application/x-vnd.be-symlink", B_MINI_ICON),
 		TrackerIcon(link, B_MINI_ICON));
 	EXPECT_EQ(TypeIcon("application/x-vnd.be-directory", B_LARGE_ICON),
-		TrackerIcon(fRoot.Make("folder/"), B_LARGE_ICON));
+		TrackerIcon(fRoot.Folder("folder"), B_LARGE_ICON));
 
 	entry_ref missing(0, 0, "missing");
 	BBitmap icon(BRect(0, 0, 15, 15), B_CMAP8);
 	EXPECT_NE(B_OK, BNodeInfo::GetTrackerIcon(&missing, &icon, B_MINI_ICON));
 	EXPECT_EQ(B_BAD_VALUE, BNodeInfo::GetTrackerIcon(NULL, &icon, B_MINI_ICON));
-}
-
-TEST_F(NodeInfoTest, ManyFilesOfOneTypeDecodeOneIcon)
-{
-	WriteTheme(fRoot, "Adwaita");
-	WritePng(fRoot.Path() + "/icons/Adwaita/16x16/mimetypes/text-x-generic.png",
-		16, [](int32, int32) { return Rgba{0, 0, 255, 255}; });
-	int32 before = BPrivate::IconDecodeCount();
-	for (int i = 0; i < 200; i++)
-		TrackerIcon(fRoot.Write("file" + std::to_string(i) + ".txt", ""),
-			B_MINI_ICON);
-	EXPECT_EQ(before + 1, BPrivate::IconDecodeCount());
 }

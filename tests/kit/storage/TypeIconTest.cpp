@@ -1,12 +1,9 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <thread>
 
-#include <Bitmap.h>
-#include <MimeType.h>
-
 #include "SystemPalette.h"
-#include "TypeIcons.h"
 #include "TypeTestSupport.h"
 
 using namespace TypeTest;
@@ -19,67 +16,42 @@ const char* const kVolumeType = "application/x-vnd.be-volume";
 const Rgba kRed = {255, 0, 0, 255};
 const Rgba kBlue = {0, 0, 255, 255};
 const Rgba kGreen = {0, 255, 0, 255};
-const Rgba kClear = {0, 0, 0, 0};
-
-// Left half opaque colour, right half clear; along the top row the alpha
-// climbs through the half-way mark.
-void WriteIcon(const TempFolder& root, const std::string& file, int32 size,
-	Rgba color)
-{
-	WritePng(root.Path() + "/icons/" + file, size, [&](int32 x, int32 y) {
-		if (y == 0 && x < 4)
-			return Rgba{color.red, color.green, color.blue, uint8(126 + x)};
-		return x < size / 2 ? color : kClear;
-	});
-}
 
 uint8 IndexOf(Rgba color)
 {
 	return BPrivate::IndexForColor(color.red, color.green, color.blue);
 }
 
-std::vector<uint8> Pixels(const BBitmap& bitmap)
+// Left half opaque, right half clear; along the top row the alpha climbs
+// through the half-way mark.
+std::string HalfIcon(int32 size, Rgba color)
 {
-	int32 size = bitmap.Bounds().IntegerWidth() + 1;
-	std::vector<uint8> pixels;
-	for (int32 y = 0; y < size; y++) {
-		const uint8* row = static_cast<const uint8*>(bitmap.Bits())
-			+ y * bitmap.BytesPerRow();
-		pixels.insert(pixels.end(), row, row + size);
-	}
-	return pixels;
-}
-
-std::vector<uint8> TypeIcon(const char* type, icon_size size,
-	status_t expected = B_OK)
-{
-	BBitmap bitmap(BRect(0, 0, size - 1, size - 1), B_CMAP8);
-	EXPECT_EQ(expected, BMimeType(type).GetIcon(&bitmap, size)) << type;
-	return Pixels(bitmap);
+	return Png(size, [&](int32 x, int32 y) {
+		if (y == 0 && x < 4)
+			return Rgba{color.red, color.green, color.blue, uint8(126 + x)};
+		return x < size / 2 ? color : Rgba{0, 0, 0, 0};
+	});
 }
 
 class TypeIconTest : public testing::Test {
 protected:
-	IconEnvironment fEnvironment;
-	const TempFolder& fRoot = fEnvironment.Root();
+	IconEnvironment fTheme;
 };
 
 }
 
 TEST_F(TypeIconTest, ThemeIconsOfBothSizesKeepTheirTransparency)
 {
-	WriteTheme(fRoot, "Adwaita");
-	WriteIcon(fRoot, "Adwaita/16x16/places/folder.png", 16, kRed);
-	WriteIcon(fRoot, "Adwaita/32x32/places/folder.png", 32, kBlue);
+	fTheme.WriteTheme("Adwaita");
+	fTheme.WriteIcon("Adwaita/16x16/places/folder.png", HalfIcon(16, kRed));
+	fTheme.WriteIcon("Adwaita/32x32/places/folder.png", HalfIcon(32, kBlue));
 
 	std::vector<uint8> mini = TypeIcon(kFolderType, B_MINI_ICON);
 	std::vector<uint8> large = TypeIcon(kFolderType, B_LARGE_ICON);
-
 	// Alpha 126 and 127 are transparent, 128 and 129 are not.
-	EXPECT_EQ(B_TRANSPARENT_MAGIC_CMAP8, mini[0]);
-	EXPECT_EQ(B_TRANSPARENT_MAGIC_CMAP8, mini[1]);
-	EXPECT_EQ(IndexOf(kRed), mini[2]);
-	EXPECT_EQ(IndexOf(kRed), mini[3]);
+	EXPECT_EQ(std::vector<uint8>({B_TRANSPARENT_MAGIC_CMAP8,
+		B_TRANSPARENT_MAGIC_CMAP8, IndexOf(kRed), IndexOf(kRed)}),
+		std::vector<uint8>(mini.begin(), mini.begin() + 4));
 	EXPECT_EQ(IndexOf(kRed), mini[16 * 15 + 7]);
 	EXPECT_EQ(B_TRANSPARENT_MAGIC_CMAP8, mini[16 * 15 + 8]);
 	EXPECT_EQ(IndexOf(kBlue), large[32 * 31 + 15]);
@@ -88,19 +60,22 @@ TEST_F(TypeIconTest, ThemeIconsOfBothSizesKeepTheirTransparency)
 
 TEST_F(TypeIconTest, InheritedThemesAndHicolorFillTheGaps)
 {
-	WriteTheme(fRoot, "Adwaita", "Parent");
-	WriteTheme(fRoot, "Parent", "hicolor");
-	WriteTheme(fRoot, "hicolor");
-	WriteIcon(fRoot, "Parent/16x16/places/folder.png", 16, kRed);
-	WriteIcon(fRoot, "hicolor/16x16/places/folder.png", 16, kBlue);
-	WriteIcon(fRoot, "hicolor/16x16/devices/drive-harddisk.png", 16, kGreen);
-	// Wrong size: skipped as if absent.
-	WriteIcon(fRoot, "Adwaita/16x16/mimetypes/text-plain.png", 20, kRed);
-	WriteIcon(fRoot, "hicolor/16x16/mimetypes/text-x-generic.png", 16, kBlue);
+	fTheme.WriteTheme("Adwaita", "Parent");
+	fTheme.WriteTheme("Parent", "hicolor");
+	fTheme.WriteTheme("hicolor");
+	// Passed over: a scalable folder, and a PNG of the wrong size.
+	fTheme.WriteIcon("Adwaita/scalable/places/folder.png", Png(16, kGreen));
+	fTheme.WriteIcon("Adwaita/16x16/mimetypes/text-plain.png", Png(20, kRed));
+	fTheme.WriteIcon("Parent/16x16/places/folder.png", Png(16, kRed));
+	fTheme.WriteIcon("hicolor/16x16/places/folder.png", Png(16, kBlue));
+	fTheme.WriteIcon("hicolor/16x16/devices/drive-harddisk.png",
+		Png(16, kGreen));
+	fTheme.WriteIcon("hicolor/16x16/mimetypes/text-x-generic.png",
+		Png(16, kBlue));
 
-	EXPECT_EQ(IndexOf(kRed), TypeIcon(kFolderType, B_MINI_ICON)[16 * 8]);
-	EXPECT_EQ(IndexOf(kGreen), TypeIcon(kVolumeType, B_MINI_ICON)[16 * 8]);
-	EXPECT_EQ(IndexOf(kBlue), TypeIcon("TEXT/Plain", B_MINI_ICON)[16 * 8]);
+	EXPECT_EQ(IndexOf(kRed), TypeIcon(kFolderType, B_MINI_ICON)[0]);
+	EXPECT_EQ(IndexOf(kGreen), TypeIcon(kVolumeType, B_MINI_ICON)[0]);
+	EXPECT_EQ(IndexOf(kBlue), TypeIcon("TEXT/Plain", B_MINI_ICON)[0]);
 }
 
 TEST_F(TypeIconTest, WithoutAThemeTheKitDrawsItsOwnTypes)
@@ -111,23 +86,23 @@ TEST_F(TypeIconTest, WithoutAThemeTheKitDrawsItsOwnTypes)
 		B_LARGE_ICON);
 	EXPECT_NE(folder, volume);
 	for (const std::vector<uint8>* icon : {&folder, &volume, &link}) {
-		EXPECT_NE(std::count(icon->begin(), icon->end(),
-			B_TRANSPARENT_MAGIC_CMAP8), (long)icon->size());
+		EXPECT_NE((long)icon->size(), std::count(icon->begin(), icon->end(),
+			B_TRANSPARENT_MAGIC_CMAP8));
 	}
 	TypeIcon("text/plain", B_MINI_ICON, B_ENTRY_NOT_FOUND);
 }
 
 TEST_F(TypeIconTest, EachFileIsDecodedOnce)
 {
-	WriteTheme(fRoot, "Adwaita");
-	WriteIcon(fRoot, "Adwaita/16x16/places/folder.png", 16, kRed);
-	WriteIcon(fRoot, "Adwaita/16x16/mimetypes/text-x-generic.png", 16, kBlue);
+	fTheme.WriteTheme("Adwaita");
+	fTheme.WriteIcon("Adwaita/16x16/places/folder.png", Png(16, kRed));
+	fTheme.WriteIcon("Adwaita/16x16/mimetypes/text-x-generic.png",
+		Png(16, kBlue));
 	int32 before = BPrivate::IconDecodeCount();
 
-	std::vector<uint8> first = TypeIcon(kFolderType, B_MINI_ICON);
-	EXPECT_EQ(first, TypeIcon(kFolderType, B_MINI_ICON));
+	EXPECT_EQ(TypeIcon(kFolderType, B_MINI_ICON),
+		TypeIcon(kFolderType, B_MINI_ICON));
 	EXPECT_EQ(before + 1, BPrivate::IconDecodeCount());
-
 	// Both types fall back on the same generic file.
 	TypeIcon("text/plain", B_MINI_ICON);
 	TypeIcon("text/x-readme", B_MINI_ICON);
@@ -140,12 +115,12 @@ TEST_F(TypeIconTest, EachFileIsDecodedOnce)
 
 TEST_F(TypeIconTest, ThreadsShareOneDecodedIcon)
 {
-	WriteTheme(fRoot, "Adwaita");
-	WriteIcon(fRoot, "Adwaita/32x32/places/folder.png", 32, kRed);
+	fTheme.WriteTheme("Adwaita");
+	fTheme.WriteIcon("Adwaita/32x32/places/folder.png", HalfIcon(32, kRed));
 	int32 before = BPrivate::IconDecodeCount();
 
-	std::vector<std::thread> threads;
 	std::vector<std::vector<uint8>> results(4);
+	std::vector<std::thread> threads;
 	for (auto& result : results) {
 		threads.emplace_back([&result] {
 			for (int i = 0; i < 50; i++)

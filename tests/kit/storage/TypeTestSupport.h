@@ -1,96 +1,32 @@
-// Temporary folders, environment and PNG files for the type and icon tests.
+// PNGs, icon bitmaps and icon themes for the type and icon tests.
 
 #ifndef TYPE_TEST_SUPPORT_H
 #define TYPE_TEST_SUPPORT_H
 
-#include <cstdlib>
-#include <filesystem>
-#include <fstream>
 #include <functional>
-#include <string>
-#include <vector>
 
 #include <png.h>
 
+#include <Bitmap.h>
 #include <MimeType.h>
 
+#include "StorageTestSupport.h"
 #include "TypeIcons.h"
 
 namespace TypeTest {
 
-class TempFolder {
-public:
-	TempFolder()
-	{
-		char pattern[] = "/tmp/varnel-types-XXXXXX";
-		fPath = mkdtemp(pattern);
-	}
-
-	~TempFolder() { std::filesystem::remove_all(fPath); }
-
-	const std::string& Path() const { return fPath; }
-
-	std::string Make(const std::string& relative) const
-	{
-		std::string path = fPath + "/" + relative;
-		std::filesystem::create_directories(
-			std::filesystem::path(path).parent_path());
-		return path;
-	}
-
-	std::string Write(const std::string& relative,
-		const std::string& content) const
-	{
-		std::string path = Make(relative);
-		std::ofstream(path, std::ios::binary) << content;
-		return path;
-	}
-
-private:
-	std::string fPath;
-};
-
-// Sets variables for the lifetime of the object, then restores them.
-class ScopedEnvironment {
-public:
-	void Set(const char* name, const std::string& value)
-	{
-		const char* old = getenv(name);
-		fSaved.push_back({name, old != nullptr, old != nullptr ? old : ""});
-		setenv(name, value.c_str(), 1);
-	}
-
-	~ScopedEnvironment()
-	{
-		for (auto saved = fSaved.rbegin(); saved != fSaved.rend(); saved++) {
-			if (saved->existed)
-				setenv(saved->name.c_str(), saved->value.c_str(), 1);
-			else
-				unsetenv(saved->name.c_str());
-		}
-	}
-
-private:
-	struct Saved {
-		std::string name;
-		bool existed;
-		std::string value;
-	};
-	std::vector<Saved> fSaved;
-};
+using StorageTest::Scratch;
 
 struct Rgba {
 	uint8 red, green, blue, alpha;
 };
 
-inline std::vector<uint8> EncodePng(int32 size,
+inline std::string Png(int32 size,
 	const std::function<Rgba(int32 x, int32 y)>& pixel)
 {
 	std::vector<Rgba> pixels;
-	for (int32 y = 0; y < size; y++) {
-		for (int32 x = 0; x < size; x++)
-			pixels.push_back(pixel(x, y));
-	}
+	for (int32 i = 0; i < size * size; i++)
+		pixels.push_back(pixel(i % size, i / size));
 	png_image image = {};
 	image.version = PNG_IMAGE_VERSION;
 	image.width = size;
@@ -99,62 +35,95 @@ inline std::vector<uint8> EncodePng(int32 size,
 	png_alloc_size_t length = 0;
 	png_image_write_to_memory(&image, nullptr, &length, 0, pixels.data(), 0,
 		nullptr);
-	std::vector<uint8> encoded(length);
+	std::string encoded(length, '\0');
 	png_image_write_to_memory(&image, encoded.data(), &length, 0,
 		pixels.data(), 0, nullptr);
 	return encoded;
 }
 
-inline void WritePng(const std::string& path, int32 size,
-	const std::function<Rgba(int32 x, int32 y)>& pixel)
+inline std::string Png(int32 size, Rgba color)
 {
-	std::vector<uint8> encoded = EncodePng(size, pixel);
-	std::ofstream(path, std::ios::binary).write(
-		reinterpret_cast<const char*>(encoded.data()), encoded.size());
+	return Png(size, [color](int32, int32) { return color; });
 }
 
-// An icon theme folder under root/icons/theme with the usual icon folders
-// of both sizes.
-inline void WriteTheme(const TempFolder& root, const std::string& theme,
-	const std::string& inherits = "")
+// The pixels of a B_CMAP8 bitmap, without row padding.
+inline std::vector<uint8> Pixels(const BBitmap& bitmap)
 {
-	std::string index = "[Icon Theme]\nName=" + theme
-		+ "\nInherits=" + inherits
-		+ "\nDirectories=16x16/places,16x16/mimetypes,16x16/devices,"
-		"32x32/places,32x32/mimetypes,32x32/devices,scalable/places\n";
-	for (const char* folder : {"16x16/places", "16x16/mimetypes",
-			"16x16/devices", "32x32/places", "32x32/mimetypes",
-			"32x32/devices"}) {
-		index += std::string("[") + folder + "]\nSize=" + std::string(folder, 2)
-			+ "\nType=Fixed\n";
-		root.Make("icons/" + theme + "/" + folder + "/");
-	}
-	index += "[scalable/places]\nSize=16\nType=Scalable\n";
-	root.Write("icons/" + theme + "/index.theme", index);
+	int32 width = bitmap.Bounds().IntegerWidth() + 1;
+	const uint8* bits = static_cast<const uint8*>(bitmap.Bits());
+	std::vector<uint8> pixels;
+	for (int32 offset = 0; offset < bitmap.BitsLength();
+			offset += bitmap.BytesPerRow())
+		pixels.insert(pixels.end(), bits + offset, bits + offset + width);
+	return pixels;
 }
 
-// Points HOME and the XDG folders at a fresh folder, so icons come only from
-// what a test puts there. GIO reads its MIME database folders once, so it is
-// asked something first, while they are still the system's.
+inline std::vector<uint8> TypeIcon(const char* type, icon_size size,
+	status_t expected = B_OK)
+{
+	BBitmap bitmap(BRect(0, 0, size - 1, size - 1), B_CMAP8);
+	EXPECT_EQ(expected, BMimeType(type).GetIcon(&bitmap, size)) << type;
+	return Pixels(bitmap);
+}
+
+// A private home, and XDG_DATA_DIRS pointing into it, so icons come only
+// from what a test puts there. GIO reads its MIME database folders once, so
+// it is asked something first, while XDG_DATA_DIRS is still the system's.
 class IconEnvironment {
 public:
 	IconEnvironment()
 	{
 		char description[B_MIME_TYPE_LENGTH];
 		BMimeType("text/plain").GetShortDescription(description);
-		fEnvironment.Set("HOME", fRoot.Make("home"));
-		fEnvironment.Set("XDG_DATA_HOME", fRoot.Make("home/.local/share"));
-		fEnvironment.Set("XDG_DATA_DIRS", fRoot.Path());
+		const char* dataDirs = getenv("XDG_DATA_DIRS");
+		if (dataDirs != nullptr)
+			fDataDirs = dataDirs;
+		setenv("XDG_DATA_DIRS", Root().Folder("share").c_str(), 1);
 		BPrivate::FlushIconCache();
 	}
 
-	~IconEnvironment() { BPrivate::FlushIconCache(); }
+	~IconEnvironment()
+	{
+		if (fDataDirs)
+			setenv("XDG_DATA_DIRS", fDataDirs->c_str(), 1);
+		else
+			unsetenv("XDG_DATA_DIRS");
+		BPrivate::FlushIconCache();
+	}
 
-	const TempFolder& Root() const { return fRoot; }
+	const Scratch& Root() const { return fHome.Root(); }
+
+	// A theme with the usual folders of both sizes, and a scalable one that
+	// must be passed over.
+	void WriteTheme(const std::string& theme,
+		const std::string& inherits = "") const
+	{
+		std::string folders = "scalable/places";
+		std::string sections = "[scalable/places]\nSize=16\nType=Scalable\n";
+		for (const char* size : {"16", "32"}) {
+			for (const char* context : {"places", "mimetypes", "devices"}) {
+				std::string folder = std::string(size) + "x" + size + "/"
+					+ context;
+				folders += "," + folder;
+				sections += "[" + folder + "]\nSize=" + size
+					+ "\nType=Fixed\n";
+			}
+		}
+		WriteIcon(theme + "/index.theme", "[Icon Theme]\nInherits="
+			+ inherits + "\nDirectories=" + folders + "\n" + sections);
+	}
+
+	// A file below share/icons.
+	void WriteIcon(const std::string& file, const std::string& content) const
+	{
+		std::string path = "share/icons/" + file;
+		Root().Folder(path.substr(0, path.rfind('/')));
+		Root().File(path, content);
+	}
 
 private:
-	TempFolder fRoot;
-	ScopedEnvironment fEnvironment;
+	StorageTest::PrivateHome fHome;
+	std::optional<std::string> fDataDirs;
 };
 
 }
