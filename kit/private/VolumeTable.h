@@ -23,8 +23,6 @@ struct VolumeEntry {
 	// from the file system.
 	uint32 flags = 0;
 	bool boot = false;
-
-	bool operator==(const VolumeEntry& other) const = default;
 };
 
 // The kit's table of volumes: the system's mounts, the file named by
@@ -37,10 +35,11 @@ public:
 	static VolumeTable& Default();
 
 	// Test support. Replace takes over from the system and the file (roots
-	// are canonicalised; ids must be positive and distinct); Mount and
-	// Unmount then change that table one volume at a time; UseSystem goes
-	// back to the file or the system. Each sends the events of a real
-	// change before returning.
+	// must exist and are canonicalised; ids must be positive int32 values
+	// and distinct); Mount and Unmount take over the current table the same
+	// way and change it one volume at a time; UseSystem goes back to the
+	// file or the system, reading VARNEL_VOLUME_TABLE again. Each has sent
+	// the events of a real change when it returns.
 	status_t Replace(const std::vector<VolumeEntry>& volumes);
 	status_t Mount(const VolumeEntry& volume);
 	status_t Unmount(dev_t device);
@@ -65,6 +64,7 @@ public:
 private:
 	VolumeTable();
 	VolumeTable(const VolumeTable&) = delete;
+	status_t _Replace(const std::vector<VolumeEntry>& volumes);
 	VolumeTable& operator=(const VolumeTable&) = delete;
 
 	struct Private;

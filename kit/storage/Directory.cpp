@@ -276,15 +276,22 @@ status_t BDirectory::GetStatFor(const char* path, struct stat* st) const
 		return B_BAD_VALUE;
 	if (fstatat(_FileDescriptor(), path, st, AT_SYMLINK_NOFOLLOW) != 0)
 		return StatusFromErrno();
-	if (std::strchr(path, '/') == nullptr && !S_ISDIR(st->st_mode)) {
+	// Only a folder can be the root of another volume.
+	bool name = BPrivate::CheckName(path) == B_OK;
+	if (name && !S_ISDIR(st->st_mode)) {
 		st->st_dev = _Device();
 		return B_OK;
 	}
 	std::string absolute;
-	BPrivate::EntryPath entry;
 	status_t status = _Absolute(path, &absolute);
-	if (status == B_OK)
-		status = BPrivate::CanonicalEntry(absolute.c_str(), false, &entry);
+	if (status != B_OK)
+		return status;
+	if (name) {
+		st->st_dev = BPrivate::DeviceOfNode(absolute, *st, _Device());
+		return B_OK;
+	}
+	BPrivate::EntryPath entry;
+	status = BPrivate::CanonicalEntry(absolute.c_str(), false, &entry);
 	if (status != B_OK)
 		return status;
 	st->st_dev = BPrivate::DeviceOfNode(entry.Path(), *st,

@@ -108,13 +108,12 @@ status_t CanonicalEntry(const char* path, bool traverse, EntryPath* entry)
 	if (status != B_OK)
 		return status;
 
-	bool mustBeFolder = false;
-	while (absolute.size() > 1 && absolute.back() == '/') {
-		absolute.pop_back();
-		mustBeFolder = true;
-	}
-	SplitPath(absolute, entry);
-	if (mustBeFolder || entry->leaf == "." || entry->leaf == "..") {
+	std::string trimmed = absolute;
+	while (trimmed.size() > 1 && trimmed.back() == '/')
+		trimmed.pop_back();
+	SplitPath(trimmed, entry);
+	// A trailing "/" asks for a folder, and "." and ".." name one.
+	if (trimmed != absolute || entry->leaf == "." || entry->leaf == "..") {
 		std::string canonical;
 		status = CanonicalPath(absolute.c_str(), &canonical);
 		if (status != B_OK)

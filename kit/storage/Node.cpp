@@ -176,15 +176,19 @@ status_t BNode::_SetToPath(const char* path, int openFlags)
 status_t BNode::_SetToAt(const BDirectory* dir, const char* path,
 	int openFlags)
 {
-	Unset();
 	if (dir == nullptr || path == nullptr || path[0] == '\0')
-		return fCStatus = B_BAD_VALUE;
+		return _Fail(B_BAD_VALUE);
 	const BNode* folder = dir;
 	if (path[0] != '/' && folder->InitCheck() != B_OK)
-		return fCStatus = folder->InitCheck();
+		return _Fail(folder->InitCheck());
+	// Opened before this node lets go of its own, which may be dir.
 	int dirFd = path[0] == '/' ? AT_FDCWD : folder->_FileDescriptor();
-	return _Adopt(openat(dirFd, path,
-		openFlags | O_CLOEXEC | O_NOCTTY | O_NONBLOCK, 0666));
+	int fd = openat(dirFd, path, openFlags | O_CLOEXEC | O_NOCTTY | O_NONBLOCK,
+		0666);
+	if (fd < 0)
+		return _Fail(BPrivate::StatusFromErrno());
+	Unset();
+	return _Adopt(fd);
 }
 
 // Takes fd, just opened (or the open's failure), as this node.

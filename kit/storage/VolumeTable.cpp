@@ -111,6 +111,9 @@ struct VolumeTable::Private {
 	// Guarded by changeLock.
 	DeviceIdFolder folder;
 
+	// Serialises the test edits, which read the table and then replace it.
+	std::mutex editLock;
+
 	int mountInfoFd = -1;
 	int inotifyFd = -1;
 	int wakeFd = -1;
@@ -275,10 +278,16 @@ VolumeTable& VolumeTable::Default()
 
 status_t VolumeTable::Replace(const std::vector<VolumeEntry>& volumes)
 {
+	std::lock_guard<std::mutex> editing(fPrivate->editLock);
+	return _Replace(volumes);
+}
+
+status_t VolumeTable::_Replace(const std::vector<VolumeEntry>& volumes)
+{
 	std::vector<VolumeEntry> canonical;
 	for (VolumeEntry volume : volumes) {
 		char root[PATH_MAX];
-		if (volume.device <= 0 || volume.device > INT32_MAX
+		if (volume.device == 0 || volume.device > INT32_MAX
 			|| realpath(volume.root.c_str(), root) == nullptr) {
 			return B_BAD_VALUE;
 		}
@@ -298,20 +307,22 @@ status_t VolumeTable::Replace(const std::vector<VolumeEntry>& volumes)
 
 status_t VolumeTable::Mount(const VolumeEntry& volume)
 {
+	std::lock_guard<std::mutex> editing(fPrivate->editLock);
 	std::vector<VolumeEntry> volumes = Volumes();
 	volumes.push_back(volume);
-	return Replace(volumes);
+	return _Replace(volumes);
 }
 
 status_t VolumeTable::Unmount(dev_t device)
 {
+	std::lock_guard<std::mutex> editing(fPrivate->editLock);
 	std::vector<VolumeEntry> volumes = Volumes();
 	if (std::erase_if(volumes, [&](const VolumeEntry& volume) {
 			return volume.device == device;
 		}) == 0) {
 		return B_BAD_VALUE;
 	}
-	return Replace(volumes);
+	return _Replace(volumes);
 }
 
 void VolumeTable::UseSystem()
