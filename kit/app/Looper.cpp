@@ -44,13 +44,18 @@ void LooperThread(std::shared_ptr<LooperPort> port, BLooper* looper,
 
 	// Once the port is closed, nothing here touches the looper again.
 	while (std::unique_ptr<BMessage> message = port->Next(B_INFINITE_TIMEOUT)) {
-		if (port->Lock(B_INFINITE_TIMEOUT) != B_OK)
-			return;
-		LooperAccess::Dispatch(looper, std::move(message));
-		if (LooperAccess::IsQuitting(looper)) {
-			delete looper;
+		if (port->Lock(B_INFINITE_TIMEOUT) != B_OK) {
+			port->DoneDispatching();
 			return;
 		}
+		LooperAccess::Dispatch(looper, std::move(message));
+		const bool quitting = LooperAccess::IsQuitting(looper);
+		if (quitting)
+			delete looper;
+		// Idle only now: the looper's windows and views are gone with it.
+		port->DoneDispatching();
+		if (quitting)
+			return;
 		port->Unlock();
 	}
 }
@@ -87,7 +92,6 @@ void LooperAccess::Dispatch(BLooper* looper, std::unique_ptr<BMessage> message)
 		data.current = nullptr;
 	}
 	message.reset();
-	data.port->DoneDispatching();
 }
 
 bool LooperAccess::DispatchQueued(BLooper* looper, bigtime_t timeout)
@@ -101,6 +105,7 @@ bool LooperAccess::DispatchQueued(BLooper* looper, bigtime_t timeout)
 		if (port->Lock(B_INFINITE_TIMEOUT) != B_OK)
 			return false;
 		Dispatch(looper, std::move(message));
+		port->DoneDispatching();
 		port->Unlock();
 		if (left-- == 0)
 			break;

@@ -20,7 +20,8 @@ class LooperAccess {
 public:
 	static const std::shared_ptr<LooperPort>& Port(const BLooper* looper);
 	// Delivers message to the handler it is addressed to, with the looper
-	// locked by the caller, then deletes it unless it was detached.
+	// locked by the caller, then deletes it unless it was detached. The
+	// caller then ends the dispatch (LooperPort::DoneDispatching).
 	// Quit was called in the looper's own thread.
 	static bool IsQuitting(const BLooper* looper);
 	static void Dispatch(BLooper* looper, std::unique_ptr<BMessage> message);

@@ -239,8 +239,9 @@ void LooperPort::SetRunning(bool running)
 bool LooperPort::IsIdle() const
 {
 	std::lock_guard<std::mutex> lock(fMutex);
-	return fClosed || !fRunning || fModalDepth > fModalEndedEarly
-		|| (fQueue.empty() && !fDispatching);
+	if (fModalDepth > 0)
+		return true;
+	return !fDispatching && (fClosed || !fRunning || fQueue.empty());
 }
 
 void LooperPort::EnterModal()
@@ -252,26 +253,11 @@ void LooperPort::EnterModal()
 	NotifyIdle();
 }
 
-void LooperPort::EndModalEarly()
-{
-	{
-		std::lock_guard<std::mutex> lock(fMutex);
-		if (fModalDepth == fModalEndedEarly)
-			return;
-		fModalEndedEarly++;
-	}
-	NotifyBusy();
-}
-
 void LooperPort::LeaveModal()
 {
 	{
 		std::lock_guard<std::mutex> lock(fMutex);
 		fModalDepth--;
-		if (fModalEndedEarly > 0) {
-			fModalEndedEarly--;
-			return;
-		}
 	}
 	NotifyBusy();
 }

@@ -32,7 +32,8 @@ public:
 	status_t Post(std::unique_ptr<BMessage> message);
 	// The next message, waiting at most timeout; NULL on timeout, once closed
 	// or once a stop is requested. The port then counts as dispatching until
-	// DoneDispatching.
+	// DoneDispatching, also once closed: a looper quitting in its own thread
+	// is busy until it is deleted.
 	std::unique_ptr<BMessage> Next(bigtime_t timeout);
 	void DoneDispatching();
 	int32 CountMessages() const;
@@ -63,9 +64,6 @@ public:
 	void SetRunning(bool running);
 	bool IsIdle() const;
 	void EnterModal();
-	// A modal wait ended by the thread that releases it (EndModalWait),
-	// before the blocked thread leaves its scope.
-	void EndModalEarly();
 	void LeaveModal();
 
 private:
@@ -82,7 +80,6 @@ private:
 	bool fDispatching = false;
 	bool fRunning = false;
 	int32 fModalDepth = 0;
-	int32 fModalEndedEarly = 0;
 	thread_id fOwner = -1;
 	int32 fLockCount = 0;
 	thread_id fThread = -1;

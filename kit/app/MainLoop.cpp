@@ -101,10 +101,4 @@ ModalWaitScope::~ModalWaitScope()
 		LooperAccess::Port(looper)->LeaveModal();
 }
 
-void EndModalWait(thread_id waitingThread)
-{
-	if (BLooper* looper = BLooper::LooperForThread(waitingThread))
-		LooperAccess::Port(looper)->EndModalEarly();
-}
-
 }

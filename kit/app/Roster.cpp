@@ -16,6 +16,7 @@
 #include <Message.h>
 #include <Path.h>
 
+#include "GioLock.h"
 #include "RosterPrivate.h"
 
 namespace {
@@ -86,6 +87,7 @@ status_t StartApp(GAppInfo* app, GList* files)
 
 status_t OpenWithDefaultApp(const char* path)
 {
+	std::lock_guard<std::mutex> lock(BPrivate::GioLock());
 	GObjectRef<GFile> file(g_file_new_for_path(path));
 	GError* error = nullptr;
 	GObjectRef<GAppInfo> app(g_file_query_default_handler(file.get(), nullptr, &error));
@@ -94,8 +96,35 @@ status_t OpenWithDefaultApp(const char* path)
 	return StartApp(app.get(), &files);
 }
 
+status_t OpenUris(int count, const char* const* uris)
+{
+	std::lock_guard<std::mutex> lock(BPrivate::GioLock());
+	for (int i = 0; i < count; i++) {
+		GError* error = nullptr;
+		const gboolean started = g_app_info_launch_default_for_uri(uris[i], nullptr,
+			&error);
+		g_clear_error(&error);
+		if (!started)
+			return B_LAUNCH_FAILED;
+	}
+	return B_OK;
+}
+
+status_t StartDefaultAppWith(const char* mimeType, int count, const char* const* args)
+{
+	std::lock_guard<std::mutex> lock(BPrivate::GioLock());
+	GObjectRef<GAppInfo> app(g_app_info_get_default_for_type(mimeType, FALSE));
+	GList* files = nullptr;
+	for (int i = count - 1; i >= 0; i--)
+		files = g_list_prepend(files, g_file_new_for_commandline_arg(args[i]));
+	const status_t result = StartApp(app.get(), files);
+	g_list_free_full(files, g_object_unref);
+	return result;
+}
+
 status_t StartDefaultAppFor(const char* mimeType)
 {
+	std::lock_guard<std::mutex> lock(BPrivate::GioLock());
 	GObjectRef<GAppInfo> app(g_app_info_get_default_for_type(mimeType, FALSE));
 	return StartApp(app.get(), nullptr);
 }
@@ -167,6 +196,24 @@ status_t BRoster::Launch(const char* mimeType, BMessage* /*initialMessage*/,
 	if (LaunchSubstituted(mimeType, &result))
 		return result;
 	return StartDefaultAppFor(mimeType);
+}
+
+status_t BRoster::Launch(const char* mimeType, int argc, const char* const* args,
+	team_id* appTeam) const
+{
+	if (mimeType == nullptr || argc < 0 || (argc > 0 && args == nullptr))
+		return B_BAD_VALUE;
+	SetUnknownTeam(appTeam);
+	std::string what(mimeType);
+	for (int i = 0; i < argc; i++)
+		what += std::string(" ") + args[i];
+	status_t result;
+	if (LaunchSubstituted(what.c_str(), &result))
+		return result;
+	static const char kUrlPrefix[] = "application/x-vnd.Be.URL.";
+	if (strncasecmp(mimeType, kUrlPrefix, sizeof(kUrlPrefix) - 1) == 0)
+		return OpenUris(argc, args);
+	return StartDefaultAppWith(mimeType, argc, args);
 }
 
 team_id BRoster::TeamFor(const char* signature) const

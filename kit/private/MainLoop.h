@@ -1,7 +1,7 @@
 #ifndef KIT_PRIVATE_MAIN_LOOP_H
 #define KIT_PRIVATE_MAIN_LOOP_H
 
-#include <OS.h>
+#include <SupportDefs.h>
 
 class BApplication;
 class BLooper;
@@ -47,12 +47,6 @@ public:
 	ModalWaitScope(const ModalWaitScope&) = delete;
 	ModalWaitScope& operator=(const ModalWaitScope&) = delete;
 };
-
-// Called by the thread that ends a modal call (the alert's button, the
-// menu's choice) just before it lets waitingThread go: that looper counts as
-// busy again at once, so an idle wait cannot finish in the moment before the
-// released thread runs. Its ModalWaitScope's end then changes nothing more.
-void EndModalWait(thread_id waitingThread);
 
 }
 

@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
+#include <chrono>
 #include <functional>
 #include <future>
 #include <memory>
@@ -343,7 +344,10 @@ TEST(Looper, QuitInItsThreadEndsAfterTheCurrentMessage)
 	looper->PostMessage('quit');
 	looper->PostMessage('late');
 	looper->Unlock();
-	deleted.get_future().get();
+	// The looper is busy until it is deleted.
+	ASSERT_TRUE(BPrivate::WaitForIdleLoopers(kHangGuard));
+	EXPECT_EQ(std::future_status::ready,
+		deleted.get_future().wait_for(std::chrono::seconds(0)));
 
 	ASSERT_EQ(1u, log.Count());
 	EXPECT_EQ(uint32('quit'), log.Messages().front().what);
@@ -432,11 +436,15 @@ TEST(Looper, IdleWaitFollowsMessagesFromLooperToLooperAndModalWaits)
 	auto* first = new TestLooper(firstLog);
 	const BMessenger toSecond(second);
 	std::promise<void> release;
+	std::promise<void> awake;
 	std::shared_future<void> released = release.get_future().share();
 	first->onMessage = [&](BMessage* message) {
 		if (message->what == 'modl') {
-			BPrivate::ModalWaitScope modal;
-			released.wait();
+			{
+				BPrivate::ModalWaitScope modal;
+				released.wait();
+			}
+			awake.set_value();
 			return;
 		}
 		toSecond.SendMessage(message);
@@ -454,8 +462,9 @@ TEST(Looper, IdleWaitFollowsMessagesFromLooperToLooperAndModalWaits)
 	first->PostMessage('step');
 	ASSERT_TRUE(BPrivate::WaitForIdleLoopers(kHangGuard));
 	EXPECT_EQ(50u, last.Count());
-	BPrivate::EndModalWait(first->Thread());
+	// Whoever ends a modal call waits until the caller is out of it.
 	release.set_value();
+	awake.get_future().get();
 	ASSERT_TRUE(BPrivate::WaitForIdleLoopers(kHangGuard));
 	EXPECT_EQ(51u, last.Count());
 	QuitLooper(first);
