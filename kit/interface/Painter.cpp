@@ -229,32 +229,26 @@ void Painter::StrokeLine(BPoint start, BPoint end, const pattern& p)
 	int32 dx = x1 - x0;
 	int32 dy = y1 - y0;
 
-	// Each step along the major axis draws one run of the pen's width across it.
-	Region line;
-	if (std::abs(dx) >= std::abs(dy)) {
-		if (dy == 0) {
-			line.Include(IntRect(min_c(x0, x1), y0 - before, max_c(x0, x1), y0 + after));
-		} else {
-			int32 steps = std::abs(dx);
-			for (int32 i = 0; i <= steps; i++) {
-				int32 x = x0 + (dx > 0 ? i : -i);
-				int32 y = y0 + int32((2 * int64(i) * dy + (dy > 0 ? steps : -steps))
-					/ (2 * steps));
-				line.Include(IntRect(x, y - before, x, y + after));
-			}
-		}
-	} else if (dx == 0) {
-		line.Include(IntRect(x0 - before, min_c(y0, y1), x0 + after, max_c(y0, y1)));
-	} else {
-		int32 steps = std::abs(dy);
-		for (int32 i = 0; i <= steps; i++) {
-			int32 y = y0 + (dy > 0 ? i : -i);
-			int32 x = x0 + int32((2 * int64(i) * dx + (dx > 0 ? steps : -steps))
-				/ (2 * steps));
-			line.Include(IntRect(x - before, y, x + after, y));
-		}
+	if (dx == 0 || dy == 0) {
+		IntRect box(min_c(x0, x1), min_c(y0, y1), max_c(x0, x1), max_c(y0, y1));
+		_Fill(dy == 0 ? IntRect(box.left, box.top - before, box.right, box.bottom + after)
+			: IntRect(box.left - before, box.top, box.right + after, box.bottom), p);
+		return;
 	}
-	_FillRegion(line, p);
+	// Each step along the major axis draws one run of the pen's width across
+	// it; runs of different steps never overlap.
+	bool xMajor = std::abs(dx) >= std::abs(dy);
+	int32 steps = max_c(std::abs(dx), std::abs(dy));
+	auto offset = [steps](int32 delta, int32 step) {
+		int64 scaled = 2 * int64(step) * delta;
+		return int32((scaled + (delta > 0 ? steps : -steps)) / (2 * steps));
+	};
+	for (int32 step = 0; step <= steps; step++) {
+		int32 x = x0 + offset(dx, step);
+		int32 y = y0 + offset(dy, step);
+		_Fill(xMajor ? IntRect(x, y - before, x, y + after)
+			: IntRect(x - before, y, x + after, y), p);
+	}
 }
 
 void Painter::InvertRect(BRect rect)

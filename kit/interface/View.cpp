@@ -12,9 +12,7 @@
 #include "ViewData.h"
 #include "WindowData.h"
 
-using BPrivate::IntRect;
 using BPrivate::PixelRect;
-using BPrivate::Region;
 using BPrivate::ViewAccess;
 using BPrivate::ViewData;
 using BPrivate::WindowAccess;

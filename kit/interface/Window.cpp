@@ -8,11 +8,9 @@
 #include "Display.h"
 #include "ViewData.h"
 #include "WindowData.h"
-#include "WindowHooks.h"
 
 using BPrivate::Display;
 using BPrivate::DisplayWindow;
-using BPrivate::IntRect;
 using BPrivate::ViewAccess;
 using BPrivate::WindowAccess;
 using BPrivate::WindowData;
@@ -125,8 +123,8 @@ BWindow::BWindow(BBitmap* bitmap)
 	data.surface.bits = static_cast<uint8*>(bitmap->Bits());
 	data.surface.bytesPerRow = bitmap->BytesPerRow();
 	data.surface.space = bitmap->ColorSpace();
-	data.surface.width = PixelSize(bounds.Width());
-	data.surface.height = PixelSize(bounds.Height());
+	data.surface.width = bounds.IntegerWidth() + 1;
+	data.surface.height = bounds.IntegerHeight() + 1;
 	data.hideLevel = 0;
 	data.topView = new BView(bounds, "top view", B_FOLLOW_ALL, 0);
 	data.topView->SetViewColor(B_TRANSPARENT_COLOR);

@@ -399,12 +399,11 @@ void SdlDriver::_HandleKey(const SDL_KeyboardEvent& event)
 	if (bytes[0] == 0) {
 		// A character: without Ctrl, Alt or the logo key its text follows as
 		// SDL_TEXTINPUT, which carries what the keyboard layout made of it.
-		if (key <= 0 || key >= 0x80)
-			return;
-		if (what == B_KEY_DOWN && (event.keysym.mod & kShortcutMods) == 0) {
+		if (what == B_KEY_DOWN)
 			fPendingKey = rawKey;
+		bool shortcut = (event.keysym.mod & kShortcutMods) != 0;
+		if ((what == B_KEY_DOWN && !shortcut) || key <= 0 || key >= 0x80)
 			return;
-		}
 		bytes[0] = char(key);
 	}
 	Display::Default().PostKey(*target, what, bytes, rawKey,
