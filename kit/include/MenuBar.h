@@ -31,7 +31,6 @@ public:
 	virtual void MouseMoved(BPoint where, uint32 transit, const BMessage* dragMessage);
 	virtual void MouseUp(BPoint where);
 	virtual void MessageReceived(BMessage* message);
-	virtual void WindowActivated(bool active);
 
 private:
 	std::unique_ptr<BPrivate::MenuBarData> fMenuBarData;

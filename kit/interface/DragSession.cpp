@@ -1,6 +1,8 @@
 #include <View.h>
 
 #include <Bitmap.h>
+#include <InterfaceDefs.h>
+#include <Looper.h>
 #include <Message.h>
 #include <Window.h>
 
@@ -85,11 +87,15 @@ private:
 
 class ViewDrag : public DragSession {
 public:
-	ViewDrag(const BMessage& message, BPoint offset, BHandler* replyTo, DragWindow* image)
+	ViewDrag(const BMessage& message, BPoint offset, BHandler* replyTo, BWindow* source,
+		DragWindow* image)
 		:
 		fMessage(message),
 		fOffset(offset),
 		fReplyTo(replyTo != nullptr ? BMessenger(replyTo) : BMessenger()),
+		fSource(source),
+		fSourceMessenger(source),
+		fSourceOrigin(source->Frame().LeftTop()),
 		fImage(image),
 		fImageMessenger(image)
 	{
@@ -112,6 +118,17 @@ public:
 
 	void Released(BPoint screenWhere) override
 	{
+		// The window that got the press hears of its release, wherever the
+		// display delivered it.
+		if (BLooper::LooperForThread(find_thread(NULL)) != fSource) {
+			BMessage release(B_MOUSE_UP);
+			release.AddInt64("when", system_time());
+			release.AddPoint("where", screenWhere - fSourceOrigin);
+			release.AddPoint("screen_where", screenWhere);
+			release.AddInt32("buttons", 0);
+			release.AddInt32("modifiers", int32(modifiers()));
+			fSourceMessenger.SendMessage(&release);
+		}
 		// The frontmost window under the pointer, the image aside.
 		for (const auto& window : Display::Default().Windows()) {
 			{
@@ -133,14 +150,17 @@ private:
 	const BMessage fMessage;
 	const BPoint fOffset;
 	const BMessenger fReplyTo;
-	// Identity only: the window may be gone.
+	// Identities only: the windows may be gone.
+	const BLooper* const fSource;
+	const BMessenger fSourceMessenger;
+	const BPoint fSourceOrigin;
 	const BWindow* const fImage;
 	const BMessenger fImageMessenger;
 };
 
-// Starts a drag whose image, of size imageBounds, has its point offset
-// under the pointer.
-void StartDrag(const BMessage& message, BRect imageBounds, BBitmap* bitmap,
+// Starts a drag from source whose image, of size imageBounds, has its point
+// offset under the pointer.
+void StartDrag(BView* source, const BMessage& message, BRect imageBounds, BBitmap* bitmap,
 	drawing_mode mode, BPoint offset, BHandler* replyTo)
 {
 	BPoint pointer;
@@ -148,7 +168,8 @@ void StartDrag(const BMessage& message, BRect imageBounds, BBitmap* bitmap,
 	Display::Default().GetPointer(&pointer, &buttons);
 	DragWindow* image = new DragWindow(imageBounds.OffsetToCopy(pointer - offset), bitmap,
 		mode);
-	SetDragSession(std::make_shared<ViewDrag>(message, offset, replyTo, image));
+	SetDragSession(std::make_shared<ViewDrag>(message, offset, replyTo, source->Window(),
+		image));
 	image->Show();
 }
 
@@ -158,12 +179,12 @@ void StartDrag(const BMessage& message, BRect imageBounds, BBitmap* bitmap,
 
 void BView::DragMessage(BMessage* message, BRect dragRect, BHandler* replyTo)
 {
-	if (message == nullptr || !dragRect.IsValid())
+	if (message == nullptr || !dragRect.IsValid() || Window() == nullptr)
 		return;
 	BPoint pointer;
 	uint32 buttons;
 	BPrivate::Display::Default().GetPointer(&pointer, &buttons);
-	BPrivate::StartDrag(*message, dragRect.OffsetToCopy(B_ORIGIN), nullptr, B_OP_COPY,
+	BPrivate::StartDrag(this, *message, dragRect.OffsetToCopy(B_ORIGIN), nullptr, B_OP_COPY,
 		pointer - ConvertToScreen(dragRect.LeftTop()), replyTo);
 }
 
@@ -176,8 +197,8 @@ void BView::DragMessage(BMessage* message, BBitmap* bitmap, drawing_mode dragMod
 	BPoint offset, BHandler* replyTo)
 {
 	std::unique_ptr<BBitmap> owned(bitmap);
-	if (message == nullptr || bitmap == nullptr || !bitmap->IsValid())
+	if (message == nullptr || bitmap == nullptr || !bitmap->IsValid() || Window() == nullptr)
 		return;
 	BRect bounds = bitmap->Bounds().OffsetToCopy(B_ORIGIN);
-	BPrivate::StartDrag(*message, bounds, owned.release(), dragMode, offset, replyTo);
+	BPrivate::StartDrag(this, *message, bounds, owned.release(), dragMode, offset, replyTo);
 }

@@ -155,10 +155,3 @@ void BMenuBar::MessageReceived(BMessage* message)
 	BPrivate::ForgetPress(Window());
 	Window()->MenusEnded();
 }
-
-void BMenuBar::WindowActivated(bool active)
-{
-	if (!active && fMenuBarData->session != nullptr)
-		fMenuBarData->session->Cancel();
-	BMenu::WindowActivated(active);
-}

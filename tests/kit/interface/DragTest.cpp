@@ -143,6 +143,25 @@ TEST_F(DragTest, ADropWhereNoWindowIsTakesNothing)
 	EXPECT_EQ(fTarget->recorder.Count('move'), 1);
 }
 
+TEST_F(DragTest, AReleaseSeenByAnotherWindowEndsThePressToo)
+{
+	PostMouse(fSourceWindow, B_MOUSE_DOWN, BPoint(20, 30));
+	Idle();
+	PostMouse(fTargetWindow, B_MOUSE_UP, BPoint(40, 40), 0);
+	Idle();
+	EXPECT_EQ(fTarget->recorder.Count('move'), 1);
+	// The source window's next press goes where it falls, not to the source.
+	RecordingView* other = new RecordingView(BRect(0, 0, 9, 9), "other");
+	ASSERT_TRUE(fSourceWindow->Lock());
+	fSource->MoveTo(10, 10);
+	fSourceWindow->AddChild(other);
+	fSourceWindow->Unlock();
+	PostMouse(fSourceWindow, B_MOUSE_DOWN, BPoint(5, 5));
+	PostMouse(fSourceWindow, B_MOUSE_UP, BPoint(5, 5), 0);
+	Idle();
+	EXPECT_TRUE(DragImages().empty());
+}
+
 TEST_F(DragTest, ARectangleCanStandForTheImage)
 {
 	fSource->dragsRectangle = true;

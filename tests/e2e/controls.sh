@@ -1,0 +1,100 @@
+#!/usr/bin/env bash
+# The controls as a user meets them: the demo of ControlsDemo.cpp under
+# Xvfb with the SDL backend, driven by xdotool. The demo prints each outcome
+# on a line of its own.
+#   tests/e2e/controls.sh PATH/TO/controls_demo
+set -euo pipefail
+
+program="$(realpath "$1")"
+side="$(mktemp -d /tmp/varnel-e2e-controls-XXXXXX)"
+export HOME="$side/home"
+export XDG_DATA_HOME="$HOME/.local/share" XDG_CONFIG_HOME="$HOME/.config"
+export XDG_CACHE_HOME="$HOME/.cache"
+mkdir -p "$HOME"
+log="$side/log"
+pids=()
+
+cleanup() {
+	for pid in "${pids[@]}"; do
+		kill "$pid" 2>/dev/null || true
+		wait "$pid" 2>/dev/null || true
+	done
+	rm -rf "$side"
+}
+trap cleanup EXIT
+
+fail() {
+	echo "FAIL: $*" >&2
+	echo "The demo said:" >&2
+	cat "$log" >&2
+	exit 1
+}
+
+# Waits for the demo to print line.
+expect() {
+	for _ in $(seq 100); do
+		grep -qxF "$1" "$log" && return 0
+		sleep 0.1
+	done
+	fail "no '$1'"
+}
+
+Xvfb -displayfd 5 -screen 0 1024x768x24 -nolisten tcp 5>"$side/display" 2>/dev/null &
+pids+=($!)
+for _ in $(seq 100); do
+	[[ -s "$side/display" ]] && break
+	sleep 0.1
+done
+export DISPLAY=":$(cat "$side/display")"
+
+VARNEL_BACKEND=sdl "$program" >"$log" &
+demo=$!
+pids+=("$demo")
+window="$(timeout 20 xdotool search --sync --onlyvisible --name '^Controls demo$' | head -n 1)" \
+	|| fail "no demo window"
+timeout 20 xdotool search --sync --onlyvisible --name '^Drop target$' >/dev/null || fail "no drop target"
+xdotool windowfocus --sync "$window"
+sleep 0.5
+
+# The demo window's content starts at (40, 30) on the screen; the menu bar
+# takes its first 20 rows and opens "Files" below its title, with items 17
+# rows high from 3 rows down.
+xdotool mousemove 55 40 click 1
+sleep 0.5
+xdotool mousemove 75 78 click 1
+expect "menu Rename"
+
+# A click in the upper part of the action view opens a pop-up menu under the
+# pointer; a second click chooses its second item.
+xdotool mousemove 140 70 click 1
+sleep 0.5
+xdotool mousemove 160 98 click 1
+expect "popup message Second"
+expect "popup returned Second"
+
+# A press in its lower part starts a drag, dropped on the other window.
+xdotool mousemove 90 120 mousedown 1
+sleep 0.3
+xdotool mousemove 200 120
+sleep 0.2
+xdotool mousemove 450 100
+sleep 0.3
+xdotool mouseup 1
+expect "dropped move at 450,100"
+
+# The button asks with an alert, which Enter answers with its last button.
+xdotool mousemove 90 195 click 1
+alert="$(timeout 20 xdotool search --sync --onlyvisible --name '^Question$' | head -n 1)" \
+	|| fail "no alert"
+xdotool windowfocus --sync "$alert" key Return
+expect "alert answered Yes"
+
+# Ctrl+Q chooses Quit.
+xdotool windowfocus --sync "$window" key ctrl+q
+for _ in $(seq 100); do
+	kill -0 "$demo" 2>/dev/null || break
+	sleep 0.1
+done
+kill -0 "$demo" 2>/dev/null && fail "the demo did not quit"
+wait "$demo" || fail "the demo failed"
+echo "ok"
