@@ -34,7 +34,6 @@ public:
 	bool IsDefault() const;
 
 	virtual void GetPreferredSize(float* width, float* height);
-	virtual void ResizeToPreferred();
 
 private:
 	std::unique_ptr<BPrivate::ButtonData> fButtonData;

@@ -71,7 +71,6 @@ public:
 	menu_layout Layout() const;
 
 	virtual void GetPreferredSize(float* width, float* height);
-	virtual void ResizeToPreferred();
 
 protected:
 	BMenu(BRect frame, const char* name, uint32 resizingMode, uint32 flags,

@@ -49,7 +49,6 @@ public:
 	virtual void Reset(const char* label = NULL, const char* trailingLabel = NULL);
 
 	virtual void GetPreferredSize(float* width, float* height);
-	virtual void ResizeToPreferred();
 
 private:
 	void _SetValue(float value);

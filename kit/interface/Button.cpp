@@ -163,10 +163,3 @@ void BButton::GetPreferredSize(float* width, float* height)
 		*height = std::ceil(fontHeight.ascent + fontHeight.descent) + 12 + ring;
 }
 
-void BButton::ResizeToPreferred()
-{
-	float width;
-	float height;
-	GetPreferredSize(&width, &height);
-	ResizeTo(width, height);
-}

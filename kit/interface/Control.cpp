@@ -3,8 +3,9 @@
 #include <string>
 
 #include <Message.h>
-#include <OS.h>
 #include <Window.h>
+
+#include "InvokerPrivate.h"
 
 namespace BPrivate {
 
@@ -98,12 +99,6 @@ bool BControl::IsEnabled() const
 
 status_t BControl::Invoke(BMessage* message)
 {
-	if (message == nullptr)
-		message = Message();
-	if (message == nullptr)
-		return B_BAD_VALUE;
-	BMessage copy(*message);
-	copy.AddInt64("when", system_time());
-	copy.AddPointer("source", this);
-	return BInvoker::Invoke(&copy);
+	std::unique_ptr<BMessage> copy = BPrivate::StampedCopy(this, message, this);
+	return copy != nullptr ? BInvoker::Invoke(copy.get()) : B_BAD_VALUE;
 }

@@ -3,6 +3,9 @@
 #include <Handler.h>
 #include <Looper.h>
 #include <Message.h>
+#include <OS.h>
+
+#include "InvokerPrivate.h"
 
 namespace BPrivate {
 
@@ -12,6 +15,23 @@ struct InvokerData {
 	BHandler* replyTo = nullptr;
 	bigtime_t timeout = B_INFINITE_TIMEOUT;
 };
+
+}
+
+namespace BPrivate {
+
+std::unique_ptr<BMessage> StampedCopy(const BInvoker* invoker, const BMessage* message,
+	const void* source)
+{
+	if (message == nullptr)
+		message = invoker->Message();
+	if (message == nullptr)
+		return nullptr;
+	auto copy = std::make_unique<BMessage>(*message);
+	copy->AddInt64("when", system_time());
+	copy->AddPointer("source", source);
+	return copy;
+}
 
 }
 

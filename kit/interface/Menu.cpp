@@ -25,6 +25,21 @@ namespace {
 constexpr float kColumnInset = 3;
 constexpr float kItemPadding = 4;
 
+// The first item of menu or of its submenus, depth first, that matches.
+template<typename Match>
+BMenuItem* FindIn(const BMenu* menu, const Match& match)
+{
+	for (int32 i = 0; BMenuItem* item = menu->ItemAt(i); i++) {
+		if (match(item))
+			return item;
+		if (item->Submenu() != nullptr) {
+			if (BMenuItem* found = FindIn(item->Submenu(), match))
+				return found;
+		}
+	}
+	return nullptr;
+}
+
 // Ctrl stands for the menu key on a PC keyboard.
 uint32 ShortcutModifiers(uint32 modifiers)
 {
@@ -113,18 +128,12 @@ int32 MenuAccess::NextSelectable(const BMenu* menu, int32 index, int32 direction
 BMenuItem* MenuAccess::FindShortcut(const BMenu* menu, char key, uint32 modifiers)
 {
 	modifiers = ShortcutModifiers(modifiers);
-	for (BMenuItem* item : Data(menu).items) {
+	return FindIn(menu, [&](BMenuItem* item) {
 		uint32 itemModifiers;
 		char shortcut = item->Shortcut(&itemModifiers);
-		if (shortcut != 0 && tolower(uint8(shortcut)) == tolower(uint8(key))
-			&& ShortcutModifiers(itemModifiers | B_COMMAND_KEY) == modifiers)
-			return item;
-		if (item->Submenu() != nullptr) {
-			if (BMenuItem* found = FindShortcut(item->Submenu(), key, modifiers))
-				return found;
-		}
-	}
-	return nullptr;
+		return shortcut != 0 && tolower(uint8(shortcut)) == tolower(uint8(key))
+			&& ShortcutModifiers(itemModifiers | B_COMMAND_KEY) == modifiers;
+	});
 }
 
 void MenuAccess::Install(BMenu* menu, BLooper* looper)
@@ -331,30 +340,16 @@ int32 BMenu::IndexOf(BMenu* menu) const
 
 BMenuItem* BMenu::FindItem(uint32 command) const
 {
-	for (BMenuItem* item : fMenuData->items) {
-		if (item->Message() != nullptr && item->Command() == command)
-			return item;
-		if (item->Submenu() != nullptr) {
-			if (BMenuItem* found = item->Submenu()->FindItem(command))
-				return found;
-		}
-	}
-	return nullptr;
+	return FindIn(this, [command](BMenuItem* item) {
+		return item->Message() != nullptr && item->Command() == command;
+	});
 }
 
 BMenuItem* BMenu::FindItem(const char* label) const
 {
 	if (label == nullptr)
 		return nullptr;
-	for (BMenuItem* item : fMenuData->items) {
-		if (strcmp(item->Label(), label) == 0)
-			return item;
-		if (item->Submenu() != nullptr) {
-			if (BMenuItem* found = item->Submenu()->FindItem(label))
-				return found;
-		}
-	}
-	return nullptr;
+	return FindIn(this, [label](BMenuItem* item) { return strcmp(item->Label(), label) == 0; });
 }
 
 BMenuItem* BMenu::FindMarked()
@@ -445,10 +440,3 @@ void BMenu::GetPreferredSize(float* width, float* height)
 		*height = size.y;
 }
 
-void BMenu::ResizeToPreferred()
-{
-	float width;
-	float height;
-	GetPreferredSize(&width, &height);
-	ResizeTo(width, height);
-}

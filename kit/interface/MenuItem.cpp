@@ -4,9 +4,9 @@
 
 #include <Menu.h>
 #include <Message.h>
-#include <OS.h>
 
 #include "ControlLook.h"
+#include "InvokerPrivate.h"
 #include "MenuPrivate.h"
 
 namespace look = BPrivate::ControlLook;
@@ -142,15 +142,11 @@ status_t BMenuItem::Invoke(BMessage* message)
 {
 	if (!IsEnabled())
 		return B_ERROR;
-	if (message == nullptr)
-		message = Message();
-	if (message == nullptr)
+	std::unique_ptr<BMessage> copy = BPrivate::StampedCopy(this, message, this);
+	if (copy == nullptr)
 		return B_BAD_VALUE;
-	BMessage copy(*message);
-	copy.AddInt64("when", system_time());
-	copy.AddPointer("source", this);
-	copy.AddInt32("index", Menu() != nullptr ? Menu()->IndexOf(this) : -1);
-	return BInvoker::Invoke(&copy);
+	copy->AddInt32("index", Menu() != nullptr ? Menu()->IndexOf(this) : -1);
+	return BInvoker::Invoke(copy.get());
 }
 
 void BMenuItem::GetContentSize(float* width, float* height)

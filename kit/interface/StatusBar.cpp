@@ -223,14 +223,6 @@ void BStatusBar::GetPreferredSize(float* width, float* height)
 	}
 }
 
-void BStatusBar::ResizeToPreferred()
-{
-	float width;
-	float height;
-	GetPreferredSize(&width, &height);
-	ResizeTo(width, height);
-}
-
 void BStatusBar::_SetValue(float value)
 {
 	fStatusBarData->value = std::clamp(value, 0.0f, fStatusBarData->max);

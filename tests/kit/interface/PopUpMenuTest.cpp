@@ -99,6 +99,15 @@ protected:
 		PostMouse(fWindow, what, fWindow->ConvertFromScreen(screen), buttons);
 	}
 
+	// Drags the pointer, the button still held since the press, to screen
+	// and releases it there.
+	void ReleaseAt(BPoint screen)
+	{
+		Post(B_MOUSE_MOVED, screen, B_PRIMARY_MOUSE_BUTTON);
+		Post(B_MOUSE_UP, screen, 0);
+		Idle();
+	}
+
 	PopUpView* fView;
 	RecordingWindow* fWindow;
 };
@@ -126,10 +135,7 @@ TEST_F(PopUpMenuTest, AClickOpensItAndASecondClickChooses)
 
 TEST_F(PopUpMenuTest, PressDragAndReleaseChooses)
 {
-	BRect menu = Open();
-	Post(B_MOUSE_MOVED, ItemPoint(menu, 0), B_PRIMARY_MOUSE_BUTTON);
-	Post(B_MOUSE_UP, ItemPoint(menu, 0), 0);
-	Idle();
+	ReleaseAt(ItemPoint(Open(), 0));
 	EXPECT_EQ(fView->Result(), "Open");
 	EXPECT_EQ(fView->recorder.Count('open'), 1);
 }
@@ -193,9 +199,7 @@ TEST_F(PopUpMenuTest, ReleasingFarAwayClosesWithoutOpenAnyway)
 {
 	fView->openAnyway = false;
 	Open();
-	Post(B_MOUSE_MOVED, BPoint(110, 230), B_PRIMARY_MOUSE_BUTTON);
-	Post(B_MOUSE_UP, BPoint(110, 230), 0);
-	Idle();
+	ReleaseAt(BPoint(110, 230));
 	EXPECT_TRUE(OpenMenus().empty());
 	EXPECT_EQ(fView->Result(), "(none)");
 }
@@ -203,10 +207,7 @@ TEST_F(PopUpMenuTest, ReleasingFarAwayClosesWithoutOpenAnyway)
 TEST_F(PopUpMenuTest, WithoutDeliveryOnlyTheResultTells)
 {
 	fView->deliversMessage = false;
-	BRect menu = Open();
-	Post(B_MOUSE_MOVED, ItemPoint(menu, 0), B_PRIMARY_MOUSE_BUTTON);
-	Post(B_MOUSE_UP, ItemPoint(menu, 0), 0);
-	Idle();
+	ReleaseAt(ItemPoint(Open(), 0));
 	EXPECT_EQ(fView->Result(), "Open");
 	EXPECT_TRUE(fView->recorder.Messages().empty());
 	EXPECT_TRUE(fWindow->recorder.Messages().empty());
@@ -215,10 +216,7 @@ TEST_F(PopUpMenuTest, WithoutDeliveryOnlyTheResultTells)
 TEST_F(PopUpMenuTest, ItemsWithoutTargetGoToTheOpeningWindow)
 {
 	fView->targeted = false;
-	BRect menu = Open();
-	Post(B_MOUSE_MOVED, ItemPoint(menu, 0), B_PRIMARY_MOUSE_BUTTON);
-	Post(B_MOUSE_UP, ItemPoint(menu, 0), 0);
-	Idle();
+	ReleaseAt(ItemPoint(Open(), 0));
 	EXPECT_EQ(fWindow->recorder.Count('open'), 1);
 }
 
