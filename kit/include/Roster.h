@@ -38,6 +38,12 @@ public:
 		team_id* appTeam = NULL) const;
 	status_t Launch(const char* mimeType, BMessage* initialMessage = NULL,
 		team_id* appTeam = NULL) const;
+	// For the platform's URL types ("application/x-vnd.Be.URL.mailto", ...)
+	// each argument is a URL handed to the desktop's handler of its scheme;
+	// for any other type the arguments are files for the type's default
+	// application. Nothing passes through a shell.
+	status_t Launch(const char* mimeType, int argc, const char* const* args,
+		team_id* appTeam = NULL) const;
 
 	team_id TeamFor(const char* signature) const;
 	team_id TeamFor(const entry_ref* ref) const;

@@ -237,13 +237,18 @@ TEST(Roster, LaunchGoesToTheTestHookAndNeverStartsAnything)
 	EXPECT_EQ(B_OK, be_roster->Launch(&folderRef));
 	answer = B_LAUNCH_FAILED;
 	EXPECT_EQ(B_LAUNCH_FAILED, be_roster->Launch("text/plain"));
-	EXPECT_EQ((std::vector<std::string>{file, folder.Path(), "text/plain"}), launched);
+	answer = B_OK;
+	const char* link[] = { "mailto:someone@example.org" };
+	EXPECT_EQ(B_OK, be_roster->Launch("application/x-vnd.Be.URL.mailto", 1, link));
+	EXPECT_EQ((std::vector<std::string>{file, folder.Path(), "text/plain",
+		"application/x-vnd.Be.URL.mailto mailto:someone@example.org"}), launched);
+	EXPECT_EQ(B_BAD_VALUE, be_roster->Launch("text/plain", 1, NULL));
 
 	// Nothing there: refused before anything is started.
 	entry_ref missing = RefFor(folder.Path() + "/missing");
 	EXPECT_EQ(B_ENTRY_NOT_FOUND, be_roster->Launch(&missing));
 	EXPECT_EQ(B_BAD_VALUE, be_roster->Launch(static_cast<const entry_ref*>(NULL)));
-	EXPECT_EQ(3u, launched.size());
+	EXPECT_EQ(4u, launched.size());
 	BPrivate::SetLaunchHook(nullptr);
 }
 
