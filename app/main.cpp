@@ -1,9 +1,9 @@
-#include <Application.h>
+#include "AppVarnel.h"
 
 int main()
 {
-	BApplication app("application/x-vnd.Quillmoor.Varnel-2");
-	app.PostMessage(B_QUIT_REQUESTED);
-	app.Run();
+	AppVarnel* app = new AppVarnel;
+	app->Run();
+	delete app;
 	return 0;
 }
