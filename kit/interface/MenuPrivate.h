@@ -145,15 +145,23 @@ private:
 
 	explicit MenuSession(const Options& options);
 
-	// The methods below run with fLock held by lock.
+	struct Opening {
+		BMenu* menu = nullptr;
+		BRect anchor;
+		Placement placement = Placement::kAtPoint;
+		bool selectFirst = false;
+		// fChanges when it was asked for.
+		uint32 changes = 0;
+	};
+
+	// The methods below run with fLock held.
 	Hit _HitTest(BPoint screenWhere) const;
-	void _Hover(const Hit& hit, std::unique_lock<std::mutex>& lock);
+	void _Hover(const Hit& hit);
 	void _Select(int32 level, int32 index);
 	void _CloseFrom(int32 level);
-	void _Open(BMenu* menu, BRect anchor, Placement placement, bool selectFirst,
-		std::unique_lock<std::mutex>& lock);
-	void _OpenSubmenu(int32 level, bool selectFirst, std::unique_lock<std::mutex>& lock);
-	void _SwitchBar(int32 direction, std::unique_lock<std::mutex>& lock);
+	void _Open(const Opening& opening);
+	void _OpenSubmenu(int32 level, bool selectFirst);
+	void _SwitchBar(int32 direction);
 	void _Choose(BMenuItem* item);
 	void _End(BMenuItem* chosen);
 	bool _IsFinished() const { return fDone && fAttached.empty(); }
@@ -164,6 +172,8 @@ private:
 	std::vector<Level> fLevels;
 	// Menus in windows that have not let them go yet.
 	std::vector<BMenu*> fAttached;
+	// A menu to open once its previous window lets it go.
+	Opening fPending;
 	BMenu* fRoot = nullptr;
 	bool fSticky = false;
 	// Counts the changes of levels and selections.

@@ -120,9 +120,9 @@ std::shared_ptr<MenuSession> MenuSession::StartPopUp(BMenu* menu, BPoint where,
 	const Options& options)
 {
 	std::shared_ptr<MenuSession> session(new MenuSession(options));
-	std::unique_lock<std::mutex> lock(session->fLock);
+	std::lock_guard<std::mutex> guard(session->fLock);
 	session->fRoot = menu;
-	session->_Open(menu, BRect(where, where), Placement::kAtPoint, false, lock);
+	session->_Open({menu, BRect(where, where), Placement::kAtPoint, false, 0});
 	return session;
 }
 
@@ -131,12 +131,12 @@ std::shared_ptr<MenuSession> MenuSession::StartBar(BMenuBar* bar, int32 index, b
 	Options options;
 	options.deliversMessage = true;
 	std::shared_ptr<MenuSession> session(new MenuSession(options));
-	std::unique_lock<std::mutex> lock(session->fLock);
+	std::lock_guard<std::mutex> guard(session->fLock);
 	session->fSticky = session->fSticky || byKeyboard;
 	session->fLevels.push_back({bar, bar->ConvertToScreen(bar->Bounds()), BMessenger(bar),
 		BMessenger(), -1, true});
 	session->_Select(0, index);
-	session->_OpenSubmenu(0, byKeyboard, lock);
+	session->_OpenSubmenu(0, byKeyboard);
 	return session;
 }
 
@@ -157,13 +157,13 @@ MenuSession::Hit MenuSession::_HitTest(BPoint screenWhere) const
 
 void MenuSession::MouseEvent(uint32 what, BPoint screenWhere, uint32 buttons)
 {
-	std::unique_lock<std::mutex> lock(fLock);
+	std::lock_guard<std::mutex> guard(fLock);
 	if (fDone)
 		return;
 	Hit hit = _HitTest(screenWhere);
 	switch (what) {
 		case B_MOUSE_MOVED:
-			_Hover(hit, lock);
+			_Hover(hit);
 			break;
 		case B_MOUSE_DOWN:
 			// A click outside closes the menus, and so does a click on the
@@ -172,7 +172,7 @@ void MenuSession::MouseEvent(uint32 what, BPoint screenWhere, uint32 buttons)
 					&& hit.index == fLevels[hit.level].selected)) {
 				_End(nullptr);
 			} else
-				_Hover(hit, lock);
+				_Hover(hit);
 			break;
 		case B_MOUSE_UP:
 		{
@@ -199,7 +199,7 @@ void MenuSession::MouseEvent(uint32 what, BPoint screenWhere, uint32 buttons)
 
 void MenuSession::KeyEvent(const char* bytes)
 {
-	std::unique_lock<std::mutex> lock(fLock);
+	std::lock_guard<std::mutex> guard(fLock);
 	if (fDone || fLevels.empty())
 		return;
 	fSticky = true;
@@ -226,25 +226,25 @@ void MenuSession::KeyEvent(const char* bytes)
 			if (cascaded)
 				_CloseFrom(deepest);
 			else if (fLevels[0].isBar)
-				_SwitchBar(-1, lock);
+				_SwitchBar(-1);
 			break;
 		case B_RIGHT_ARROW:
 			if (selected != nullptr && selected->Submenu() != nullptr)
-				_OpenSubmenu(deepest, true, lock);
+				_OpenSubmenu(deepest, true);
 			else if (fLevels[0].isBar)
-				_SwitchBar(1, lock);
+				_SwitchBar(1);
 			break;
 		case B_ENTER:
 		case B_SPACE:
 			if (selected != nullptr && selected->Submenu() != nullptr)
-				_OpenSubmenu(deepest, true, lock);
+				_OpenSubmenu(deepest, true);
 			else if (selected != nullptr)
 				_Choose(selected);
 			break;
 	}
 }
 
-void MenuSession::_Hover(const Hit& hit, std::unique_lock<std::mutex>& lock)
+void MenuSession::_Hover(const Hit& hit)
 {
 	if (hit.level < 0) {
 		// Off the menus: nothing stays selected in the innermost one.
@@ -266,7 +266,7 @@ void MenuSession::_Hover(const Hit& hit, std::unique_lock<std::mutex>& lock)
 	_CloseFrom(hit.level + 1);
 	_Select(hit.level, hit.index);
 	if (opens)
-		_OpenSubmenu(hit.level, false, lock);
+		_OpenSubmenu(hit.level, false);
 }
 
 void MenuSession::_Select(int32 level, int32 index)
@@ -290,20 +290,20 @@ void MenuSession::_CloseFrom(int32 level)
 	}
 }
 
-void MenuSession::_Open(BMenu* menu, BRect anchor, Placement placement, bool selectFirst,
-	std::unique_lock<std::mutex>& lock)
+void MenuSession::_Open(const Opening& opening)
 {
-	// A menu closed a moment ago may still be in its window. Should the
-	// menus change meanwhile, this opening is stale.
-	uint32 changes = fChanges;
-	fChanged.wait(lock, [&] {
-		return std::find(fAttached.begin(), fAttached.end(), menu) == fAttached.end();
-	});
-	if (fDone || fChanges != changes)
+	BMenu* menu = opening.menu;
+	// A menu closed a moment ago may still be in its window: it opens when
+	// the window lets it go, unless the menus change meanwhile.
+	if (std::find(fAttached.begin(), fAttached.end(), menu) != fAttached.end()) {
+		fPending = opening;
+		fPending.changes = fChanges;
 		return;
+	}
 	BPoint size = MenuAccess::Layout(menu);
+	BRect anchor = opening.anchor;
 	BRect frame;
-	switch (placement) {
+	switch (opening.placement) {
 		case Placement::kAtPoint:
 			frame = Place(size, anchor.LeftTop(),
 				BPoint(anchor.left - size.x - 1, anchor.top - size.y - 1));
@@ -317,7 +317,7 @@ void MenuSession::_Open(BMenu* menu, BRect anchor, Placement placement, bool sel
 				BPoint(anchor.left - size.x + 1, anchor.bottom + 3 - size.y));
 			break;
 	}
-	int32 selected = selectFirst ? MenuAccess::NextSelectable(menu, -1, 1) : -1;
+	int32 selected = opening.selectFirst ? MenuAccess::NextSelectable(menu, -1, 1) : -1;
 	MenuAccess::Data(menu).selected = selected;
 	MenuWindow* window = new MenuWindow(shared_from_this(), menu, frame);
 	fLevels.push_back({menu, frame, BMessenger(menu), BMessenger(window), selected, false});
@@ -326,7 +326,7 @@ void MenuSession::_Open(BMenu* menu, BRect anchor, Placement placement, bool sel
 	window->Show();
 }
 
-void MenuSession::_OpenSubmenu(int32 level, bool selectFirst, std::unique_lock<std::mutex>& lock)
+void MenuSession::_OpenSubmenu(int32 level, bool selectFirst)
 {
 	const Level& parent = fLevels[level];
 	BMenuItem* item = parent.menu->ItemAt(parent.selected);
@@ -335,11 +335,11 @@ void MenuSession::_OpenSubmenu(int32 level, bool selectFirst, std::unique_lock<s
 	BRect anchor = item->Frame().OffsetByCopy(parent.frame.LeftTop());
 	if (!parent.isBar)
 		anchor.right = parent.frame.right;
-	_Open(item->Submenu(), anchor, parent.isBar ? Placement::kBelow : Placement::kBeside,
-		selectFirst, lock);
+	_Open({item->Submenu(), anchor, parent.isBar ? Placement::kBelow : Placement::kBeside,
+		selectFirst, 0});
 }
 
-void MenuSession::_SwitchBar(int32 direction, std::unique_lock<std::mutex>& lock)
+void MenuSession::_SwitchBar(int32 direction)
 {
 	const Level& bar = fLevels[0];
 	int32 index = MenuAccess::NextSelectable(bar.menu, bar.selected, direction);
@@ -347,7 +347,7 @@ void MenuSession::_SwitchBar(int32 direction, std::unique_lock<std::mutex>& lock
 		return;
 	_CloseFrom(1);
 	_Select(0, index);
-	_OpenSubmenu(0, true, lock);
+	_OpenSubmenu(0, true);
 }
 
 void MenuSession::_Choose(BMenuItem* item)
@@ -388,6 +388,12 @@ void MenuSession::Released(BMenu* menu)
 {
 	std::unique_lock<std::mutex> lock(fLock);
 	std::erase(fAttached, menu);
+	if (fPending.menu == menu) {
+		Opening pending = fPending;
+		fPending.menu = nullptr;
+		if (!fDone && pending.changes == fChanges)
+			_Open(pending);
+	}
 	bool deleteMenu = fOptions.autoDelete && menu == fRoot && fDone;
 	bool finished = _IsFinished();
 	fChanged.notify_all();

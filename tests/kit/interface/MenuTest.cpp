@@ -261,6 +261,21 @@ TEST_F(MenuTest, TheKeyboardWorksInAnOpenMenu)
 	EXPECT_EQ(fWindow->menusEnded, 3);
 }
 
+TEST_F(MenuTest, AMenuStillClosingReopensOnceItsWindowLetsItGo)
+{
+	Click(fWindow, Title(0));
+	Idle();
+	// Left may well come while "Files" is still in its closing window.
+	Key(fWindow, "\x1d");
+	Key(fWindow, "\x1c");
+	Idle();
+	ASSERT_EQ(OpenMenus().size(), 1u);
+	EXPECT_EQ(OpenMenus()[0].title, "Files");
+	Key(fWindow, "\n");
+	Idle();
+	EXPECT_EQ(fWindow->recorder.Count('open'), 1);
+}
+
 TEST_F(MenuTest, TargetsAndLabelsCanChange)
 {
 	RecordingView* view = new RecordingView(BRect(0, 30, 50, 60));
