@@ -40,13 +40,14 @@ BMenuItem* FindIn(const BMenu* menu, const Match& match)
 	return nullptr;
 }
 
-// Ctrl stands for the menu key on a PC keyboard.
-uint32 ShortcutModifiers(uint32 modifiers)
+// The menu key is Ctrl on a PC keyboard (B_COMMAND_KEY in an item's
+// shortcut), and Alt, which the platform calls B_COMMAND_KEY, is no part of
+// a shortcut. -1 for keys held that make no shortcut.
+int32 ShortcutModifiers(uint32 held)
 {
-	uint32 kept = modifiers & (B_SHIFT_KEY | B_OPTION_KEY);
-	if ((modifiers & (B_COMMAND_KEY | B_CONTROL_KEY)) != 0)
-		kept |= B_COMMAND_KEY;
-	return kept;
+	if ((held & B_CONTROL_KEY) == 0 || (held & B_COMMAND_KEY) != 0)
+		return -1;
+	return int32(B_COMMAND_KEY | (held & (B_SHIFT_KEY | B_OPTION_KEY)));
 }
 
 }
@@ -127,12 +128,15 @@ int32 MenuAccess::NextSelectable(const BMenu* menu, int32 index, int32 direction
 
 BMenuItem* MenuAccess::FindShortcut(const BMenu* menu, char key, uint32 modifiers)
 {
-	modifiers = ShortcutModifiers(modifiers);
+	int32 held = ShortcutModifiers(modifiers);
+	if (held < 0)
+		return nullptr;
 	return FindIn(menu, [&](BMenuItem* item) {
 		uint32 itemModifiers;
 		char shortcut = item->Shortcut(&itemModifiers);
+		uint32 wanted = B_COMMAND_KEY | (itemModifiers & (B_SHIFT_KEY | B_OPTION_KEY));
 		return shortcut != 0 && tolower(uint8(shortcut)) == tolower(uint8(key))
-			&& ShortcutModifiers(itemModifiers | B_COMMAND_KEY) == modifiers;
+			&& uint32(held) == wanted;
 	});
 }
 

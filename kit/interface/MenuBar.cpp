@@ -19,12 +19,8 @@ struct MenuBarData : ShortcutHandler {
 
 	bool HandleShortcut(BWindow* window, BMessage* keyDown) override
 	{
-		// The unmodified character: with Ctrl held, bytes may be a control
-		// character.
 		int32 raw = keyDown->GetInt32("raw_char", 0);
 		char key = raw > 0 && raw < 0x80 ? char(raw) : keyDown->GetString("bytes", "")[0];
-		if (key > 0 && key < B_SPACE)
-			key += 'a' - 1;
 		BMenuItem* item = MenuAccess::FindShortcut(bar, key,
 			uint32(keyDown->GetInt32("modifiers", 0)));
 		if (item == nullptr)

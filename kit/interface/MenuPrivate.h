@@ -75,7 +75,8 @@ public:
 	// The next selectable item after index in direction (1 or -1),
 	// wrapping around; -1 when there is none.
 	static int32 NextSelectable(const BMenu* menu, int32 index, int32 direction);
-	// The item with this shortcut in menu or its submenus.
+	// The item whose shortcut the key makes with the modifier keys held, in
+	// menu or its submenus.
 	static BMenuItem* FindShortcut(const BMenu* menu, char key, uint32 modifiers);
 	// Aims the items without a target, submenus included, at looper.
 	static void Install(BMenu* menu, BLooper* looper);

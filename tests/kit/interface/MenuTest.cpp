@@ -128,12 +128,14 @@ TEST_F(MenuTest, ShortcutsInvokeEnabledItemsOnly)
 	fFiles->SetEnabled(true);
 	fWindow->Unlock();
 
-	// Shift must match; without Ctrl a letter is just a letter.
+	// Shift must match; without Ctrl, or with Alt, a letter is just a letter.
 	Shortcut("s");
 	EXPECT_EQ(fWindow->recorder.Count('save'), 0);
 	Shortcut("S", B_CONTROL_KEY | B_SHIFT_KEY);
 	EXPECT_EQ(fWindow->recorder.Count('save'), 1);
 	Shortcut("r", 0);
+	Shortcut("r", B_COMMAND_KEY);
+	Shortcut("r", B_COMMAND_KEY | B_CONTROL_KEY);
 	EXPECT_EQ(fWindow->recorder.Count('arnm'), 0);
 	Shortcut("r");
 	ASSERT_EQ(fWindow->recorder.Count('arnm'), 1);
