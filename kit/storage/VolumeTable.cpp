@@ -114,23 +114,33 @@ struct VolumeTable::Private {
 	// Serialises the test edits, which read the table and then replace it.
 	std::mutex editLock;
 
+	// Each descriptor of the mount table hears of a change once: the
+	// queries and the monitor thread each have their own.
 	int mountInfoFd = -1;
+	int monitorFd = -1;
 	int inotifyFd = -1;
 	int wakeFd = -1;
 	std::thread monitor;
 	std::atomic<bool> quitting = false;
 
 	void Load(Source newSource, const VolumeSnapshot* given);
+	void LoadLocked(Source newSource, const VolumeSnapshot* given);
 	void CheckFresh();
 	void WatchTableFile();
 	void Monitor();
 };
 
-// Reads the table from newSource (or takes the one given) and tells the
-// watchers what changed.
 void VolumeTable::Private::Load(Source newSource, const VolumeSnapshot* given)
 {
 	std::lock_guard<std::mutex> changing(changeLock);
+	LoadLocked(newSource, given);
+}
+
+// Reads the table from newSource (or takes the one given) and tells the
+// watchers what changed.
+void VolumeTable::Private::LoadLocked(Source newSource,
+	const VolumeSnapshot* given)
+{
 	std::string file;
 	{
 		std::lock_guard<std::mutex> locker(lock);
@@ -171,9 +181,11 @@ void VolumeTable::Private::Load(Source newSource, const VolumeSnapshot* given)
 	}
 }
 
-// Re-reads the table when its source says it has changed.
+// Re-reads the table when its source says it has changed. A change being
+// read by another thread is waited for.
 void VolumeTable::Private::CheckFresh()
 {
+	std::lock_guard<std::mutex> changing(changeLock);
 	Source current;
 	std::string file;
 	FileSignature signature;
@@ -186,15 +198,13 @@ void VolumeTable::Private::CheckFresh()
 		stale = !loaded;
 	}
 	if (!stale && current == Source::kSystem) {
-		// The kernel flags the mount table as changed once per change, to
-		// whoever polls first: the monitor thread or this check.
 		pollfd changed = { mountInfoFd, POLLPRI, 0 };
 		stale = poll(&changed, 1, 0) > 0
 			&& (changed.revents & (POLLPRI | POLLERR)) != 0;
 	} else if (!stale && current == Source::kFile)
 		stale = !(SignatureOf(file) == signature);
 	if (stale)
-		Load(current, nullptr);
+		LoadLocked(current, nullptr);
 }
 
 // Points the inotify watch at the folder of the table file, which editors
@@ -218,7 +228,7 @@ void VolumeTable::Private::Monitor()
 {
 	while (!quitting) {
 		pollfd fds[3] = {
-			{ mountInfoFd, POLLPRI, 0 },
+			{ monitorFd, POLLPRI, 0 },
 			{ inotifyFd, POLLIN, 0 },
 			{ wakeFd, POLLIN, 0 }
 		};
@@ -249,6 +259,7 @@ VolumeTable::VolumeTable()
 	fPrivate(std::make_unique<Private>())
 {
 	fPrivate->mountInfoFd = open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC);
+	fPrivate->monitorFd = open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC);
 	fPrivate->inotifyFd = inotify_init1(IN_NONBLOCK | IN_CLOEXEC);
 	fPrivate->wakeFd = eventfd(0, EFD_NONBLOCK | EFD_CLOEXEC);
 	UseSystem();
@@ -263,8 +274,8 @@ VolumeTable::~VolumeTable()
 			;
 		fPrivate->monitor.join();
 	}
-	for (int fd : { fPrivate->mountInfoFd, fPrivate->inotifyFd,
-			fPrivate->wakeFd }) {
+	for (int fd : { fPrivate->mountInfoFd, fPrivate->monitorFd,
+			fPrivate->inotifyFd, fPrivate->wakeFd }) {
 		if (fd >= 0)
 			close(fd);
 	}
