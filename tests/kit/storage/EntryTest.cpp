@@ -258,23 +258,28 @@ TEST(EntryTest, PermissionDeniedIsReported)
 	Scratch scratch;
 	std::string closed = scratch.Folder("closed");
 	scratch.File("closed/secret", "s");
-	chmod(closed.c_str(), 0700);
-	chmod(scratch.Path().c_str(), 0755);
-	// Root reads everything: look as an ordinary user, in a child.
+	chmod(closed.c_str(), 0);
+	chmod(scratch.Path().c_str(), 0555);
+	// Root passes every permission check: the child looks as an ordinary
+	// user, then cleans up after itself as root again.
 	EXPECT_EXIT({
-		if (getuid() == 0 && (setgid(65534) != 0 || setuid(65534) != 0))
+		bool root = geteuid() == 0;
+		if (root && (setegid(65534) != 0 || seteuid(65534) != 0))
 			_exit(2);
-		if (geteuid() == 0)
-			_exit(0);
-		BDirectory dir(closed.c_str());
-		BEntry secret((closed + "/secret").c_str());
-		BEntry entry((scratch / "closed").c_str());
 		struct stat st;
-		bool denied = dir.InitCheck() == B_PERMISSION_DENIED
-			&& secret.GetStat(&st) == B_PERMISSION_DENIED
-			&& entry.Rename("open") == B_PERMISSION_DENIED;
+		bool denied = BDirectory(closed.c_str()).InitCheck()
+				== B_PERMISSION_DENIED
+			&& BEntry((closed + "/secret").c_str()).GetStat(&st)
+				== B_PERMISSION_DENIED
+			&& BEntry(closed.c_str()).Rename("open") == B_PERMISSION_DENIED;
+		if (root && (seteuid(0) != 0 || setegid(0) != 0))
+			_exit(3);
+		chmod(scratch.Path().c_str(), 0755);
+		std::filesystem::remove_all(scratch.Path());
 		_exit(denied ? 0 : 1);
 	}, ::testing::ExitedWithCode(0), "");
+	chmod(scratch.Path().c_str(), 0755);
+	chmod(closed.c_str(), 0755);
 }
 
 TEST(EntryTest, StatChangesReachTheEntryOrItsNode)
