@@ -1,10 +1,10 @@
 #include <Application.h>
 
+#include <climits>
 #include <cstring>
 #include <string>
 #include <vector>
 
-#include <climits>
 #include <strings.h>
 #include <unistd.h>
 
