@@ -81,6 +81,12 @@ struct ScrollBarData final : ScrollFollower {
 			? BRect(bounds.left, bounds.top + from, bounds.right, bounds.top + to)
 			: BRect(bounds.left + from, bounds.top, bounds.left + to, bounds.bottom);
 	}
+	// The same within the bar's outline.
+	BRect Inside(float from, float to) const
+	{
+		return Span(from, to).InsetByCopy(direction == B_VERTICAL ? 1 : 0,
+			direction == B_VERTICAL ? 0 : 1);
+	}
 
 	float TrackStart() const { return Thickness() + 1; }
 	float TrackEnd() const { return Length() - Thickness() - 1; }
@@ -207,20 +213,16 @@ void BScrollBar::Draw(BRect)
 
 	SetHighColor(look::kShadow);
 	StrokeRect(bounds);
-	data.DrawArrowBox(data.Span(1, thickness - 1).InsetByCopy(
-		data.direction == B_VERTICAL ? 1 : 0, data.direction == B_VERTICAL ? 0 : 1),
-		true, data.pressed == Part::kLessArrow);
-	data.DrawArrowBox(data.Span(data.Length() - thickness + 1, data.Length() - 1).InsetByCopy(
-		data.direction == B_VERTICAL ? 1 : 0, data.direction == B_VERTICAL ? 0 : 1),
-		false, data.pressed == Part::kMoreArrow);
-
-	BRect track = data.Span(data.TrackStart(), data.TrackEnd()).InsetByCopy(
-		data.direction == B_VERTICAL ? 1 : 0, data.direction == B_VERTICAL ? 0 : 1);
+	data.DrawArrowBox(data.Inside(1, thickness - 1), true, data.pressed == Part::kLessArrow);
+	data.DrawArrowBox(data.Inside(data.Length() - thickness + 1, data.Length() - 1), false,
+		data.pressed == Part::kMoreArrow);
+	// The lines between the arrows and the track.
 	SetHighColor(look::kShadow);
-	StrokeLine(data.Span(data.TrackStart() - 1, data.TrackStart() - 1).LeftTop(),
-		data.Span(data.TrackStart() - 1, data.TrackStart() - 1).RightBottom());
-	StrokeLine(data.Span(data.TrackEnd() + 1, data.TrackEnd() + 1).LeftTop(),
-		data.Span(data.TrackEnd() + 1, data.TrackEnd() + 1).RightBottom());
+	for (float along : {data.TrackStart() - 1, data.TrackEnd() + 1}) {
+		BRect line = data.Span(along, along);
+		StrokeLine(line.LeftTop(), line.RightBottom());
+	}
+	BRect track = data.Inside(data.TrackStart(), data.TrackEnd());
 	if (!track.IsValid())
 		return;
 	SetHighColor(look::kLightShadow);
@@ -229,8 +231,7 @@ void BScrollBar::Draw(BRect)
 		return;
 
 	float start = data.ThumbStart();
-	BRect thumb = data.Span(start, start + data.ThumbLength() - 1).InsetByCopy(
-		data.direction == B_VERTICAL ? 1 : 0, data.direction == B_VERTICAL ? 0 : 1);
+	BRect thumb = data.Inside(start, start + data.ThumbLength() - 1);
 	SetHighColor(look::kFace);
 	FillRect(thumb);
 	look::DrawBevel(this, thumb.InsetByCopy(1, 1), true);
