@@ -94,8 +94,9 @@ void TextViewData::Relayout()
 			while (fit < end
 				&& font.StringWidth(text.c_str() + start, Next(fit) - start) <= wrapWidth)
 				fit = Next(fit);
+			// A space may hang past the edge.
 			int32 space = int32(text.rfind(' ', fit));
-			int32 cut = space >= start && space < fit ? space + 1 : std::max(fit, Next(start));
+			int32 cut = space >= start && space < end ? space + 1 : std::max(fit, Next(start));
 			lines.push_back({start, cut, font.StringWidth(text.c_str() + start, cut - start)});
 			start = cut;
 		}
