@@ -49,6 +49,20 @@ protected:
 		return fWindow->ConvertFromScreen(menus[0].frame.LeftTop() + BPoint(30, kMiddles[index]));
 	}
 
+	// Clicks a title and waits for what follows.
+	void ClickTitle(int32 index)
+	{
+		Click(fWindow, Title(index));
+		Idle();
+	}
+
+	// The title of the one open menu, empty when not exactly one is open.
+	static std::string OpenTitle()
+	{
+		std::vector<BPrivate::Headless::WindowInfo> menus = OpenMenus();
+		return menus.size() == 1 ? menus[0].title : std::string();
+	}
+
 	void Shortcut(const char* key, uint32 modifiers = B_CONTROL_KEY)
 	{
 		BPrivate::Headless::SetModifiers(modifiers);
@@ -84,8 +98,7 @@ TEST_F(MenuTest, TheBarFitsItsFontAndLaysTitlesInARow)
 
 TEST_F(MenuTest, ShortcutsShowAsCtrlLettersAtTheRight)
 {
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	const BWindow* menu = OpenMenus()[0].window;
 	BRect frame = OpenMenus()[0].frame;
 	// Where the ink of a row begins, right of the labels.
@@ -146,11 +159,9 @@ TEST_F(MenuTest, ShortcutsInvokeEnabledItemsOnly)
 
 TEST_F(MenuTest, AClickOpensAMenuAndAnotherChoosesAnItem)
 {
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	EXPECT_EQ(fWindow->menusBeginning, 1);
-	ASSERT_EQ(OpenMenus().size(), 1u);
-	EXPECT_EQ(OpenMenus()[0].title, "Files");
+	EXPECT_EQ(OpenTitle(), "Files");
 	// Below its title.
 	EXPECT_EQ(OpenMenus()[0].frame.LeftTop(),
 		fWindow->ConvertToScreen(fBar->ItemAt(0)->Frame().LeftBottom() + BPoint(0, 1)));
@@ -184,11 +195,9 @@ TEST_F(MenuTest, MovingAlongTheBarSwitchesMenus)
 	Click(fWindow, Title(0));
 	PostMouse(fWindow, B_MOUSE_MOVED, Title(1), 0);
 	Idle();
-	ASSERT_EQ(OpenMenus().size(), 1u);
-	EXPECT_EQ(OpenMenus()[0].title, "Help");
+	EXPECT_EQ(OpenTitle(), "Help");
 	// A click on the open title closes it.
-	Click(fWindow, Title(1));
-	Idle();
+	ClickTitle(1);
 	EXPECT_TRUE(OpenMenus().empty());
 	EXPECT_EQ(fWindow->menusBeginning, 1);
 	EXPECT_EQ(fWindow->menusEnded, 1);
@@ -198,8 +207,7 @@ TEST_F(MenuTest, MovingAlongTheBarSwitchesMenus)
 TEST_F(MenuTest, DisabledItemsAreGreyAndStayPut)
 {
 	SetEnabled(fFiles->ItemAt(1), false);
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	const BWindow* menu = OpenMenus()[0].window;
 	// Black ink in the enabled label's row, none in the disabled one's.
 	auto inked = [&](int32 y) {
@@ -230,8 +238,7 @@ TEST_F(MenuTest, DisabledItemsAreGreyAndStayPut)
 TEST_F(MenuTest, TheKeyboardWorksInAnOpenMenu)
 {
 	// Keys go to the menu once it is open.
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	// Down twice: Open, Rename; Up twice wraps past the top to "Save as".
 	Key(fWindow, "\x1f");
 	Key(fWindow, "\x1f");
@@ -242,19 +249,16 @@ TEST_F(MenuTest, TheKeyboardWorksInAnOpenMenu)
 	EXPECT_EQ(fWindow->recorder.Count('save'), 1);
 
 	// Right moves to the next menu, with its first item selected.
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	Key(fWindow, "\x1d");
 	Idle();
-	ASSERT_EQ(OpenMenus().size(), 1u);
-	EXPECT_EQ(OpenMenus()[0].title, "Help");
+	EXPECT_EQ(OpenTitle(), "Help");
 	Key(fWindow, "\n");
 	Idle();
 	EXPECT_EQ(fWindow->recorder.Count('abou'), 1);
 
 	// Escape closes without a choice.
-	Click(fWindow, Title(1));
-	Idle();
+	ClickTitle(1);
 	Key(fWindow, "\x1b", 1);
 	Idle();
 	EXPECT_TRUE(OpenMenus().empty());
@@ -265,14 +269,12 @@ TEST_F(MenuTest, TheKeyboardWorksInAnOpenMenu)
 
 TEST_F(MenuTest, AMenuStillClosingReopensOnceItsWindowLetsItGo)
 {
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	// Left may well come while "Files" is still in its closing window.
 	Key(fWindow, "\x1d");
 	Key(fWindow, "\x1c");
 	Idle();
-	ASSERT_EQ(OpenMenus().size(), 1u);
-	EXPECT_EQ(OpenMenus()[0].title, "Files");
+	EXPECT_EQ(OpenTitle(), "Files");
 	Key(fWindow, "\n");
 	Idle();
 	EXPECT_EQ(fWindow->recorder.Count('open'), 1);
@@ -286,8 +288,7 @@ TEST_F(MenuTest, TargetsAndLabelsCanChange)
 	fFiles->SetTargetForItems(view);
 	fFiles->ItemAt(0)->SetLabel("Expand/Collapse");
 	fWindow->Unlock();
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	// The menu widened for the longer label.
 	EXPECT_GT(OpenMenus()[0].frame.Width(), 100);
 	Click(fWindow, Item(0));
@@ -298,8 +299,7 @@ TEST_F(MenuTest, TargetsAndLabelsCanChange)
 
 TEST_F(MenuTest, ClosingTheWindowClosesItsMenus)
 {
-	Click(fWindow, Title(0));
-	Idle();
+	ClickTitle(0);
 	ASSERT_EQ(OpenMenus().size(), 1u);
 	ASSERT_TRUE(fWindow->Lock());
 	fWindow->Quit();
