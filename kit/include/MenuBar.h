@@ -13,9 +13,9 @@ struct MenuBarData;
 // its menu: releasing over an item invokes it, releasing over the bar keeps
 // the menu open for clicks and the keyboard, and moving to another title
 // opens that one's menu instead. The window's MenusBeginning runs before the
-// menus open (and before a shortcut is looked up, so that it can enable and
-// disable the items), MenusEnded after they close. While attached, the bar
-// answers the shortcuts of all its items.
+// menus open, MenusEnded after they close. While attached, the bar answers
+// the shortcuts of all its items, between the same two hooks, so that the
+// window can enable and disable the item first.
 class BMenuBar : public BMenu {
 public:
 	// With resizeToFit, a bar in a row takes the height its font needs.

@@ -35,8 +35,8 @@ public:
 	virtual void WindowActivated(bool active);
 	virtual void FrameResized(float width, float height);
 
-	// Text. Insertions go where the selection starts and leave the caret
-	// after them; they stop at MaxBytes, on a character boundary.
+	// Text. Insertions go where the selection starts (a caret there moves
+	// after them) and stop at MaxBytes, on a character boundary.
 	void SetText(const char* text);
 	void SetText(const char* text, int32 length);
 	void Insert(const char* text);
