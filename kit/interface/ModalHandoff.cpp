@@ -21,14 +21,7 @@ void ModalHandoff::Signal()
 	std::unique_lock<std::mutex> lock(fLock);
 	fSignaled = true;
 	fChanged.notify_all();
-	fChanged.wait(lock, [this] { return fAwake || fAbandoned; });
-}
-
-void ModalHandoff::Abandon()
-{
-	std::lock_guard<std::mutex> guard(fLock);
-	fAbandoned = true;
-	fChanged.notify_all();
+	fChanged.wait(lock, [this] { return fAwake; });
 }
 
 }

@@ -13,17 +13,14 @@ namespace BPrivate {
 class ModalHandoff {
 public:
 	void Wait();
-	// Returns at once when nobody is to wait.
+	// Returns once the waiter is awake; call it only when someone waits.
 	void Signal();
-	// Tells Signal that nobody will wait.
-	void Abandon();
 
 private:
 	std::mutex fLock;
 	std::condition_variable fChanged;
 	bool fSignaled = false;
 	bool fAwake = false;
-	bool fAbandoned = false;
 };
 
 }
