@@ -6,23 +6,11 @@
 set -euo pipefail
 
 program="$(realpath "$1")"
-side="$(mktemp -d /tmp/varnel-e2e-controls-XXXXXX)"
-export HOME="$side/home"
-export XDG_DATA_HOME="$HOME/.local/share" XDG_CONFIG_HOME="$HOME/.config"
-export XDG_CACHE_HOME="$HOME/.cache"
-mkdir -p "$HOME"
+source "$(dirname "$0")/session.sh"
+start_session controls
 log="$side/log"
-pids=()
 
-cleanup() {
-	for pid in "${pids[@]}"; do
-		kill "$pid" 2>/dev/null || true
-		wait "$pid" 2>/dev/null || true
-	done
-	rm -rf "$side"
-}
-trap cleanup EXIT
-
+# Every failure shows what the demo said.
 fail() {
 	echo "FAIL: $*" >&2
 	echo "The demo said:" >&2
@@ -38,14 +26,6 @@ expect() {
 	done
 	fail "no '$1'"
 }
-
-Xvfb -displayfd 5 -screen 0 1024x768x24 -nolisten tcp 5>"$side/display" 2>/dev/null &
-pids+=($!)
-for _ in $(seq 100); do
-	[[ -s "$side/display" ]] && break
-	sleep 0.1
-done
-export DISPLAY=":$(cat "$side/display")"
 
 VARNEL_BACKEND=sdl "$program" >"$log" &
 demo=$!
