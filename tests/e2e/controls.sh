@@ -10,7 +10,7 @@ source "$(dirname "$0")/session.sh"
 start_session controls
 log="$side/log"
 
-# Every failure shows what the demo said.
+# Say what the demo printed along with the failure.
 fail() {
 	echo "FAIL: $*" >&2
 	echo "The demo said:" >&2
