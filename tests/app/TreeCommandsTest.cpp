@@ -111,6 +111,14 @@ TEST_F(TreeCommandsTest, DeletingTheSelectedFolderShowsTheBootVolume)
 	ASSERT_EQ(B_OK, sent[0].FindRef(GV_PARENT_REF, &shown));
 	EXPECT_EQ(Ref(boot), shown);
 	EXPECT_TRUE(sent[0].GetBool(GV_VOLUME, false));
+
+	// The selection inside a folder that goes moves to the first row too.
+	OpenInTree(Folder("boot/outer/inner"));
+	fileList->Take();
+	Command(GV_DELETE, boot + "/outer");
+	EXPECT_TRUE(Exists(trash + "/outer/inner"));
+	EXPECT_EQ(Locked([&] { return tree->first; }), Locked([&] { return tree->selected; }));
+	EXPECT_EQ("Varnel  (   " + boot + "   )", Title());
 }
 
 TEST_F(TreeCommandsTest, NewFolderNumbersAndOpensTheEditor)
