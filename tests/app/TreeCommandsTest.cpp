@@ -16,25 +16,11 @@ class TreeCommandsTest : public AppFixture {
 protected:
 	enum { kDataDevice = 31 };
 
-	int32 IndexOf(const std::string& path)
-	{
-		return Locked([&] { return tree->IndexOf(Item(path)); });
-	}
-
 	void Command(uint32 what, const std::string& path)
 	{
 		BMessage message(what);
 		message.AddInt32(GV_TREE_INDEX, IndexOf(path));
 		Post(&message);
-	}
-
-	// What the rename editor holds; empty when it is not open.
-	std::string Editor()
-	{
-		return Locked([&] {
-			return std::string(tree->renameView->Parent() == tree
-				? tree->renameView->Text() : "");
-		});
 	}
 
 	// The rename editor's answer for a row.
@@ -44,15 +30,6 @@ protected:
 		message.AddString(GV_NAME, name);
 		message.AddFloat(GV_POSITION, position);
 		Post(&message);
-	}
-
-	void OpenInTree(const std::string& path, int32 device = kBootDevice)
-	{
-		BMessage open(GV_FOLDER_OPEN);
-		entry_ref ref = Ref(path);
-		open.AddRef(GV_SOURCE_REF, &ref);
-		open.AddInt32(GV_DEVICE, device);
-		Post(&open);
 	}
 };
 

@@ -172,15 +172,11 @@ TEST_F(TreeListTest, OpeningAFolderReadsAndExpandsEveryFolderOnTheWay)
 	AddVolume(kDataDevice, "data", "Data", B_FS_IS_PERSISTENT);
 	Start();
 
-	BMessage open(GV_FOLDER_OPEN);
-	entry_ref ref = Ref(deep);
-	open.AddRef(GV_SOURCE_REF, &ref);
-	open.AddInt32(GV_DEVICE, kDataDevice);
-	Post(&open);
-	int32 d1 = Locked([&] { return tree->IndexOf(Item(data + "/d1")); });
+	OpenInTree(deep, kDataDevice);
+	int32 d1 = IndexOf(data + "/d1");
 	EXPECT_GT(d1, 0);
-	EXPECT_EQ(d1 + 1, Locked([&] { return tree->IndexOf(Item(data + "/d1/d2")); }));
-	EXPECT_EQ(d1 + 2, Locked([&] { return tree->IndexOf(Item(deep)); }));
+	EXPECT_EQ(d1 + 1, IndexOf(data + "/d1/d2"));
+	EXPECT_EQ(d1 + 2, IndexOf(deep));
 	Rows();
 	EXPECT_EQ(Item(deep), Locked([&] { return tree->selected; }));
 	EXPECT_TRUE(Locked([&] { return tree->IsFocus(); }));
@@ -189,7 +185,7 @@ TEST_F(TreeListTest, OpeningAFolderReadsAndExpandsEveryFolderOnTheWay)
 	// A folder that has gone opens nothing.
 	std::filesystem::remove(deep);
 	size_t count = Rows().size();
-	Post(&open);
+	OpenInTree(deep, kDataDevice);
 	EXPECT_EQ(count, Rows().size());
 }
 
@@ -197,11 +193,8 @@ TEST_F(TreeListTest, NothingIsFoundOrMadeInsideTheTrash)
 {
 	Folder("boot/home/.local/share/Trash/files/inside");
 	Start();
-	BMessage open(GV_FOLDER_OPEN);
+	OpenInTree(trash + "/inside");
 	entry_ref ref = Ref(trash + "/inside");
-	open.AddRef(GV_SOURCE_REF, &ref);
-	open.AddInt32(GV_DEVICE, kBootDevice);
-	Post(&open);
 	FolderItem* trashRow = Item(trash);
 	ASSERT_NE(nullptr, trashRow);
 	Locked([&] {

@@ -76,14 +76,6 @@ protected:
 		ASSERT_EQ(B_OK, message.FindFlat(GV_SOURCE_PATH, &flat));
 		EXPECT_STREQ(path.c_str(), flat.Path());
 	}
-
-	std::string Editor()
-	{
-		return Locked([&] {
-			return std::string(tree->renameView->Parent() == tree
-				? tree->renameView->Text() : "");
-		});
-	}
 };
 
 }

@@ -17,14 +17,7 @@ const rgb_color kHighlight = { 150, 150, 150, 255 };
 
 class TreeViewTest : public AppFixture {
 protected:
-	// A pixel of the window's last frame, at a point of the tree.
-	rgb_color Pixel(float x, float y)
-	{
-		BPoint point = Locked([&] {
-			return window->ConvertFromScreen(tree->ConvertToScreen(BPoint(x, y)));
-		});
-		return BPrivate::Headless::PixelAt(window, int32(point.x), int32(point.y));
-	}
+	rgb_color Pixel(float x, float y) { return PixelOf(tree, BPoint(x, y)); }
 
 	// Whether some pixel of the rectangle satisfies test.
 	template<typename Test>
@@ -37,11 +30,6 @@ protected:
 			}
 		}
 		return false;
-	}
-
-	int32 IndexOf(const std::string& path)
-	{
-		return Locked([&] { return tree->IndexOf(Item(path)); });
 	}
 
 	void Expand(const std::string& path)

@@ -114,11 +114,7 @@ TEST_F(TreeVolumesTest, MountsAndUnmountsFollowWhileRunning)
 	EXPECT_EQ(2, CountBare(fileList->Take()));
 
 	// The selection inside an unmounted volume goes back to the first row.
-	BMessage open(GV_FOLDER_OPEN);
-	entry_ref ref = Ref(data);
-	open.AddRef(GV_SOURCE_REF, &ref);
-	open.AddInt32(GV_DEVICE, kDataDevice);
-	Post(&open);
+	OpenInTree(data, kDataDevice);
 	fileList->Take();
 	ASSERT_EQ(B_OK, table.Unmount(kDataDevice));
 	Idle();

@@ -27,7 +27,9 @@
 #include <fs_info.h>
 
 #include "AppVarnel.h"
+#include "Commands.h"
 #include "FolderItem.h"
+#include "GvRenView.h"
 #include "GvTreeView.h"
 #include "GvWindow.h"
 #include "Headless.h"
@@ -199,6 +201,25 @@ protected:
 		Idle();
 	}
 
+	// Asks the tree to show the folder at path, as the file list does.
+	void OpenInTree(const std::string& path, int32 device = kBootDevice)
+	{
+		BMessage open(GV_FOLDER_OPEN);
+		entry_ref ref = Ref(path);
+		open.AddRef(GV_SOURCE_REF, &ref);
+		open.AddInt32(GV_DEVICE, device);
+		Post(&open);
+	}
+
+	// A pixel of the window's last frame, at a point of view.
+	rgb_color PixelOf(BView* view, BPoint point)
+	{
+		BPoint where = Locked([&] {
+			return window->ConvertFromScreen(view->ConvertToScreen(point));
+		});
+		return BPrivate::Headless::PixelAt(window, int32(where.x), int32(where.y));
+	}
+
 	std::string Title()
 	{
 		return Locked([&] { return std::string(window->Title()); });
@@ -216,6 +237,21 @@ protected:
 	{
 		entry_ref ref = Ref(path);
 		return Locked([&] { return tree->FindItem(&ref); });
+	}
+
+	// The index of the tree's row of the folder at path; -1 when not shown.
+	int32 IndexOf(const std::string& path)
+	{
+		return Locked([&] { return tree->IndexOf(Item(path)); });
+	}
+
+	// What the tree's rename editor holds; empty when it is not open.
+	std::string Editor()
+	{
+		return Locked([&] {
+			return std::string(tree->renameView->Parent() == tree
+				? tree->renameView->Text() : "");
+		});
 	}
 
 	// The labels of the shown rows, indented by level. Also checks that
