@@ -150,20 +150,6 @@ TEST_F(TreeListTest, RemovingARowAfterACollapsedSiblingKeepsTheChain)
 	Rows();
 }
 
-TEST_F(TreeListTest, UnmountingTheOnlyVolumeEmptiesTheTree)
-{
-	Start();
-	ASSERT_EQ(B_OK, BPrivate::VolumeTable::Default().Unmount(kBootDevice));
-	Idle();
-	EXPECT_TRUE(Rows().empty());
-	Locked([&] {
-		EXPECT_EQ(nullptr, tree->first);
-		EXPECT_EQ(nullptr, tree->selected);
-		EXPECT_EQ(GV_STATUS_PROTECTED, tree->GetStatus());
-		EXPECT_EQ(1, tree->Select(0));
-	});
-}
-
 TEST_F(TreeListTest, OpeningAFolderReadsAndExpandsEveryFolderOnTheWay)
 {
 	std::string data = Folder("data");
@@ -187,22 +173,4 @@ TEST_F(TreeListTest, OpeningAFolderReadsAndExpandsEveryFolderOnTheWay)
 	size_t count = Rows().size();
 	OpenInTree(deep, kDataDevice);
 	EXPECT_EQ(count, Rows().size());
-}
-
-TEST_F(TreeListTest, NothingIsFoundOrMadeInsideTheTrash)
-{
-	Folder("boot/home/.local/share/Trash/files/inside");
-	Start();
-	OpenInTree(trash + "/inside");
-	entry_ref ref = Ref(trash + "/inside");
-	FolderItem* trashRow = Item(trash);
-	ASSERT_NE(nullptr, trashRow);
-	Locked([&] {
-		EXPECT_EQ(trashRow, tree->selected);
-		EXPECT_EQ(GV_FOLDER_TRASH, trashRow->status);
-		EXPECT_EQ(0, trashRow->subdirCount);
-		EXPECT_EQ(trashRow, tree->FindItemUnder(trashRow, &ref));
-		EXPECT_EQ(GV_STATUS_PROTECTED, tree->GetStatus());
-	});
-	EXPECT_EQ(nullptr, Item(trash + "/inside"));
 }

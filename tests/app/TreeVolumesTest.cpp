@@ -81,20 +81,26 @@ TEST_F(TreeVolumesTest, TheDesktopAndTheTrashAreMarked)
 	Folder("boot/home/.local/share/Trash/files/old");
 	Start();
 	Locked([&] {
-		FolderItem* homeRow = tree->ItemAt(1);
-		tree->Expand_Collapse(homeRow);
+		tree->Expand_Collapse(tree->ItemAt(1));
 		FolderItem* desktopRow = Item(desktop);
 		ASSERT_NE(nullptr, desktopRow);
 		EXPECT_EQ(GV_FOLDER_DESKTOP, desktopRow->status);
 		tree->Select(tree->IndexOf(desktopRow));
 		EXPECT_EQ(GV_STATUS_DESKTOP_OR_NONE, tree->GetStatus());
-		entry_ref trashRef = Ref(trash);
-		tree->FindAndOpen(&trashRef, kBootDevice);
+	});
+
+	// Nothing inside the trash is read, found or made: opening a folder
+	// there selects the trash row.
+	OpenInTree(trash + "/old");
+	EXPECT_EQ(nullptr, Item(trash + "/old"));
+	Locked([&] {
 		FolderItem* trashRow = tree->selected;
+		EXPECT_EQ(Item(trash), trashRow);
 		EXPECT_EQ(GV_FOLDER_TRASH, trashRow->status);
-		EXPECT_TRUE(trashRow->subdirsRead);
 		EXPECT_EQ(0, trashRow->subdirCount);
-		EXPECT_GT(tree->IndexOf(trashRow), 0);
+		EXPECT_EQ(GV_STATUS_PROTECTED, tree->GetStatus());
+		entry_ref old = Ref(trash + "/old");
+		EXPECT_EQ(trashRow, tree->FindItemUnder(trashRow, &old));
 	});
 }
 
@@ -132,6 +138,14 @@ TEST_F(TreeVolumesTest, MountsAndUnmountsFollowWhileRunning)
 	Idle();
 	EXPECT_EQ((std::vector<std::string>{ "Late" }), Rows());
 	EXPECT_EQ(Locked([&] { return tree->first; }), Locked([&] { return tree->selected; }));
+	ASSERT_EQ(B_OK, table.Unmount(kLateDevice));
+	Idle();
+	EXPECT_TRUE(Rows().empty());
+	Locked([&] {
+		EXPECT_EQ(nullptr, tree->selected);
+		EXPECT_EQ(GV_STATUS_PROTECTED, tree->GetStatus());
+		EXPECT_EQ(1, tree->Select(0));
+	});
 }
 
 TEST_F(TreeVolumesTest, FoldersAreReadOnceWithTheirFirstExpansion)
