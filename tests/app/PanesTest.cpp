@@ -20,16 +20,7 @@ const rgb_color kGrey = { 205, 205, 205, 255 };
 const rgb_color kFocus = { 0, 120, 80, 255 };
 const rgb_color kBlack = { 0, 0, 0, 255 };
 
-class PanesTest : public AppFixture {
-protected:
-	rgb_color WindowPixel(BView* view, BPoint point)
-	{
-		BPoint where = Locked([&] {
-			return window->ConvertFromScreen(view->ConvertToScreen(point));
-		});
-		return BPrivate::Headless::PixelAt(window, int32(where.x), int32(where.y));
-	}
-};
+using PanesTest = AppFixture;
 
 // A stand-in pane that keeps what it is sent.
 class RecorderView : public BView {
@@ -88,14 +79,14 @@ TEST_F(PanesTest, FocusBorderFollowsTheFocus)
 {
 	Start();
 	GvFilesView* files = window->fileList;
-	EXPECT_EQ(kFocus, WindowPixel(tree->scrollFrame, BPoint(0, 0)));
-	EXPECT_EQ(kFocus, WindowPixel(tree->scrollFrame, BPoint(200, 417)));
-	EXPECT_EQ(kGrey, WindowPixel(files->scrollFrame, BPoint(0, 0)));
+	EXPECT_EQ(kFocus, PixelOf(tree->scrollFrame, BPoint(0, 0)));
+	EXPECT_EQ(kFocus, PixelOf(tree->scrollFrame, BPoint(200, 417)));
+	EXPECT_EQ(kGrey, PixelOf(files->scrollFrame, BPoint(0, 0)));
 
 	Locked([&] { files->MakeFocus(true); });
 	Idle();
-	EXPECT_EQ(kGrey, WindowPixel(tree->scrollFrame, BPoint(0, 200)));
-	EXPECT_EQ(kFocus, WindowPixel(files->scrollFrame, BPoint(450, 200)));
+	EXPECT_EQ(kGrey, PixelOf(tree->scrollFrame, BPoint(0, 200)));
+	EXPECT_EQ(kFocus, PixelOf(files->scrollFrame, BPoint(450, 200)));
 	EXPECT_TRUE(Locked([&] { return files->IsFocus() && !tree->IsFocus(); }));
 }
 

@@ -53,15 +53,6 @@ protected:
 		return Locked([&] { return std::string(window->filesMenu->ItemAt(0)->Label()); });
 	}
 
-	void Open(const std::string& path, int32 device = kBootDevice)
-	{
-		BMessage open(GV_FOLDER_OPEN);
-		entry_ref ref = Ref(path);
-		open.AddRef(GV_SOURCE_REF, &ref);
-		open.AddInt32(GV_DEVICE, device);
-		Post(&open);
-	}
-
 	// The alerts on screen, by their text.
 	std::vector<std::string> Alerts()
 	{
@@ -80,8 +71,9 @@ protected:
 	void PressEnterInAlert()
 	{
 		for (const auto& info : BPrivate::Headless::ListWindows()) {
-			if (dynamic_cast<const BAlert*>(info.window) != nullptr)
+			if (dynamic_cast<const BAlert*>(info.window) != nullptr) {
 				ASSERT_EQ(B_OK, BPrivate::Headless::PostKey(info.window, "\n"));
+			}
 		}
 		Idle();
 	}
@@ -154,11 +146,11 @@ TEST_F(WindowTest, TitleFollowsTheShownFolderWhateverItsLength)
 	Start();
 	EXPECT_EQ("Varnel  (   " + boot + "   )", Title());
 
-	Open(Folder(deep));
+	OpenInTree(Folder(deep));
 	EXPECT_EQ("Varnel  (   " + Folder(deep) + "   )", Title());
 	EXPECT_GT(Title().size(), 1036u);
 
-	Open(Folder("boot/odd \"$name\" `x`"));
+	OpenInTree(Folder("boot/odd \"$name\" `x`"));
 	EXPECT_EQ("Varnel  (   " + boot + "/odd \"$name\" `x`   )", Title());
 }
 
@@ -173,13 +165,13 @@ TEST_F(WindowTest, MenusFollowTheFocusedPaneAndItsStatus)
 	// Items 0, 1, 2, 4 and 6 in that order; the trash holds one entry.
 	EXPECT_EQ("10011", MenuState()) << "volume root";
 	EXPECT_EQ("Expand/Collapse", OpenLabel());
-	Open(boot + "/plain");
+	OpenInTree(boot + "/plain");
 	EXPECT_EQ("11111", MenuState()) << "ordinary folder";
-	Open(desktop);
+	OpenInTree(desktop);
 	EXPECT_EQ("10011", MenuState()) << "Desktop";
-	Open(trash);
+	OpenInTree(trash);
 	EXPECT_EQ("10001", MenuState()) << "Trash";
-	Open(Folder("ro"), 12);
+	OpenInTree(Folder("ro"), 12);
 	EXPECT_EQ("10001", MenuState()) << "read-only volume";
 
 	std::filesystem::remove(trash + "/junk");
@@ -200,7 +192,7 @@ TEST_F(WindowTest, CommandsGoToTheFocusedPaneOrElseToTheFileList)
 {
 	Folder("boot/plain");
 	Start();
-	Open(boot + "/plain");
+	OpenInTree(boot + "/plain");
 	BMessage rename(GV_ASK_RENAME);
 	ASSERT_EQ(B_OK, window->PostMessage(&rename));
 	Idle();
