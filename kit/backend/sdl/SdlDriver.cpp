@@ -100,6 +100,9 @@ private:
 bool SdlDriver::Init()
 {
 	SDL_SetHint(SDL_HINT_QUIT_ON_LAST_WINDOW_CLOSE, "0");
+	// Frames are drawn by the kit and only copied to the screen: the plain
+	// X11 framebuffer does that without OpenGL, which may be missing or slow.
+	SDL_SetHint(SDL_HINT_FRAMEBUFFER_ACCELERATION, "0");
 	SDL_SetHint(SDL_HINT_MOUSE_FOCUS_CLICKTHROUGH, "1");
 	SDL_SetHint(SDL_HINT_VIDEO_X11_NET_WM_BYPASS_COMPOSITOR, "0");
 	if (SDL_Init(SDL_INIT_VIDEO) != 0)
