@@ -62,11 +62,12 @@ private:
 				void* marked;
 				if (message->FindPointer("marked", &marked) == B_OK)
 					static_cast<BMenuItem*>(marked)->SetMarked(true);
-				// Hidden, the window takes input no more.
+				// Hidden, the window takes input no more; what reached it
+				// before still goes to the session ahead of the quit.
 				Hide();
 				RemoveChild(fMenu);
 				fSession->Released(fMenu);
-				Quit();
+				PostMessage(B_QUIT_REQUESTED);
 				return true;
 			}
 			default:
