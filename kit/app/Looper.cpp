@@ -331,7 +331,13 @@ void BLooper::Unlock()
 
 status_t BLooper::LockWithTimeout(bigtime_t timeout)
 {
-	return fLooperData->port->Lock(timeout);
+	// As on the platform, locking a looper that is gone fails instead of
+	// touching it; the port is held while waiting, since the looper may be
+	// deleted meanwhile.
+	std::shared_ptr<BPrivate::LooperPort> port = TokenSpace::Default().PortOf(this);
+	if (port == nullptr)
+		return B_BAD_VALUE;
+	return port->Lock(timeout);
 }
 
 bool BLooper::IsLocked() const

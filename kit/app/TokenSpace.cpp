@@ -51,8 +51,10 @@ int32 TokenSpace::LooperOf(int32 handlerToken) const
 
 void TokenSpace::AddLooper(const std::shared_ptr<LooperPort>& port)
 {
+	const BLooper* looper = port->Looper();
 	std::lock_guard<std::mutex> lock(fMutex);
 	fLoopers[port->Token()] = port;
+	fLooperTokens[looper] = port->Token();
 }
 
 void TokenSpace::RemoveLooper(int32 token)
@@ -64,6 +66,7 @@ void TokenSpace::RemoveLooper(int32 token)
 		return;
 	removed = std::move(found->second);
 	fLoopers.erase(found);
+	std::erase_if(fLooperTokens, [token](const auto& entry) { return entry.second == token; });
 }
 
 std::shared_ptr<LooperPort> TokenSpace::PortFor(int32 looperToken) const
@@ -71,6 +74,15 @@ std::shared_ptr<LooperPort> TokenSpace::PortFor(int32 looperToken) const
 	std::lock_guard<std::mutex> lock(fMutex);
 	auto found = fLoopers.find(looperToken);
 	return found != fLoopers.end() ? found->second : nullptr;
+}
+
+std::shared_ptr<LooperPort> TokenSpace::PortOf(const BLooper* looper) const
+{
+	std::lock_guard<std::mutex> lock(fMutex);
+	auto found = fLooperTokens.find(looper);
+	if (found == fLooperTokens.end())
+		return nullptr;
+	return fLoopers.at(found->second);
 }
 
 std::vector<std::shared_ptr<LooperPort>> TokenSpace::Ports() const

@@ -34,6 +34,8 @@ public:
 	void AddLooper(const std::shared_ptr<LooperPort>& port);
 	void RemoveLooper(int32 token);
 	std::shared_ptr<LooperPort> PortFor(int32 looperToken) const;
+	// The port of a looper that still exists; NULL once it is deleted.
+	std::shared_ptr<LooperPort> PortOf(const BLooper* looper) const;
 	std::vector<std::shared_ptr<LooperPort>> Ports() const;
 
 private:
@@ -46,6 +48,7 @@ private:
 	int32 fNextToken = 1;
 	std::map<int32, HandlerEntry> fHandlers;
 	std::map<int32, std::shared_ptr<LooperPort>> fLoopers;
+	std::map<const BLooper*, int32> fLooperTokens;
 };
 
 }

@@ -177,6 +177,36 @@ TEST(Looper, OtherThreadsTakeTheLockAndDispatchWaitsForThem)
 	QuitLooper(looper);
 }
 
+// A thread waiting for the lock of a looper that another thread quits (and
+// so deletes) is let go with a failure, and the looper's memory is not
+// touched after it is gone.
+TEST(Looper, WaitersForTheLockOfAQuittingLooperFail)
+{
+	MessageLog log;
+	std::promise<void> deleted;
+	auto* looper = new TestLooper(log, &deleted);
+	looper->Run();
+	ASSERT_TRUE(looper->Lock());
+	std::atomic<int> waiting{0};
+	std::vector<std::thread> waiters;
+	std::atomic<int> failed{0};
+	for (int i = 0; i < 4; i++) {
+		waiters.emplace_back([&] {
+			waiting++;
+			if (looper->LockWithTimeout(kHangGuard) != B_OK)
+				failed++;
+		});
+	}
+	while (waiting < 4)
+		std::this_thread::yield();
+	std::this_thread::sleep_for(std::chrono::milliseconds(20));
+	looper->Quit();
+	for (std::thread& waiter : waiters)
+		waiter.join();
+	deleted.get_future().wait();
+	EXPECT_EQ(4, failed.load());
+}
+
 TEST(Looper, DispatchHasTheLockTheThreadAndTheCurrentMessage)
 {
 	MessageLog log;
