@@ -32,6 +32,7 @@ private:
 	void BuildMenus();
 	void BuildPanes();
 	void RouteToFocusedPane(BMessage* message);
+	void EmptyTrash();
 	void ShowHelp();
 	void ShowFolderInTitle(BMessage* message);
 };

@@ -14,6 +14,7 @@
 #include <string>
 
 #include "Commands.h"
+#include "CopyWindow.h"
 #include "GvFilesView.h"
 #include "GvTreeView.h"
 
@@ -64,6 +65,9 @@ void GvWindow::MessageReceived(BMessage* message)
 		case GV_NEW_FOLDER:
 			RouteToFocusedPane(message);
 			break;
+		case GV_EMPTY_TRASH:
+			EmptyTrash();
+			break;
 		case GV_HELP:
 			ShowHelp();
 			break;
@@ -81,6 +85,19 @@ void GvWindow::RouteToFocusedPane(BMessage* message)
 		tree->MessageReceived(message);
 	else
 		fileList->MessageReceived(message);
+}
+
+void GvWindow::EmptyTrash()
+{
+	BRect bounds = Bounds();
+	BPoint corner = ConvertToScreen(
+		BPoint(0.25f * bounds.Width(), 0.25f * bounds.Height()));
+	CopyWindow* progress = new CopyWindow(BRect(0, 0, 200, 60).OffsetToCopy(corner));
+	progress->EmptyTrash();
+	progress->UpdateIfNeeded();
+	if (progress->Lock())
+		progress->Quit();
+	PostMessage(GV_REFRESH, fileList);
 }
 
 void GvWindow::ShowHelp()

@@ -100,8 +100,11 @@ void DeliverKey(BWindow* window, BMessage* message)
 	const char* bytes = message->GetString("bytes", "");
 	BView* target = message->what == B_KEY_DOWN && bytes[0] == B_ENTER
 		&& data.defaultButton != nullptr ? data.defaultButton : data.focus;
-	if (target == nullptr)
+	// With no focus view the window itself hears the keys, as on the platform.
+	if (target == nullptr) {
+		window->MessageReceived(message);
 		return;
+	}
 	if (message->what == B_KEY_DOWN)
 		target->KeyDown(bytes, int32(strlen(bytes)));
 	else
