@@ -12,10 +12,9 @@
 #include "GvFilesView.h"
 #include "GvScrollView.h"
 #include "GvTreeView.h"
+#include "Look.h"
 
 namespace {
-
-const rgb_color kPaneGrey = { 205, 205, 205, 255 };
 
 struct Layout {
 	BRect windowFrame;
@@ -34,8 +33,8 @@ const Layout& CurrentLayout()
 
 void SetUpPane(BView* pane)
 {
-	pane->SetViewColor(kPaneGrey);
-	pane->SetLowColor(kPaneGrey);
+	pane->SetViewColor(GV_GREY);
+	pane->SetLowColor(GV_GREY);
 	pane->SetDrawingMode(B_OP_OVER);
 }
 

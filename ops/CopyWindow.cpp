@@ -8,8 +8,9 @@
 
 #include <cstdio>
 
+#include "Look.h"
+
 namespace {
-const rgb_color kGrey = { 205, 205, 205, 255 };
 // The raw key of Escape.
 const int32 kEscapeKey = 1;
 }
@@ -21,7 +22,7 @@ CopyWindow::CopyWindow(BRect frame)
 	  itemsRemaining(0)
 {
 	backgroundView = new BView(Bounds(), "", B_FOLLOW_ALL_SIDES, B_WILL_DRAW);
-	backgroundView->SetViewColor(kGrey);
+	backgroundView->SetViewColor(GV_GREY);
 	BRect barFrame = Bounds();
 	barFrame.InsetBy(20, 20);
 	barFrame.OffsetBy(0, -10);

@@ -5,10 +5,10 @@
 #include <cstdio>
 
 #include "Commands.h"
+#include "Look.h"
 
 namespace {
 const rgb_color kBlack = { 0, 0, 0, 255 };
-const rgb_color kGrey = { 205, 205, 205, 255 };
 const BRect kBadge(10, 10, 19, 19);
 const BPoint kNameOrigin(18, 11);
 }
@@ -66,7 +66,7 @@ void GvDragView::DrawMove()
 void GvDragView::DrawIcon()
 {
 	SetHighColor(kBlack);
-	SetLowColor(kGrey);
+	SetLowColor(GV_GREY);
 	FillRect(Bounds(), B_SOLID_LOW);
 	SetDrawingMode(B_OP_OVER);
 	MovePenTo(0, 0);

@@ -3,10 +3,9 @@
 #include <ScrollBar.h>
 
 #include "GvTargetView.h"
+#include "Look.h"
 
 namespace {
-const rgb_color kFocusColor = { 0, 120, 80, 255 };
-const rgb_color kPaneGrey = { 205, 205, 205, 255 };
 // The thickness of a scroll bar's rectangle; it covers 15 pixels.
 const float kBarSize = 14;
 }
@@ -19,8 +18,8 @@ GvScrollView::GvScrollView(const char* name, GvTargetView* pane, uint32 resizing
 	  hbar(NULL),
 	  vbar(NULL)
 {
-	SetHighColor(kFocusColor);
-	SetLowColor(kPaneGrey);
+	SetHighColor(GV_FOCUS);
+	SetLowColor(GV_GREY);
 
 	target->MoveTo(0, 0);
 	borderRect = target->Bounds();

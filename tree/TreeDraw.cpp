@@ -10,10 +10,10 @@
 #include <cstring>
 
 #include "FolderItem.h"
+#include "Look.h"
 
 namespace {
 const rgb_color kBoxColor = { 80, 80, 80, 255 };
-const rgb_color kHighlight = { 150, 150, 150, 255 };
 const rgb_color kBeBlue = { 0, 0, 255, 255 };
 const rgb_color kBeRed = { 255, 0, 0, 255 };
 const rgb_color kBlack = { 0, 0, 0, 255 };
@@ -61,7 +61,7 @@ void FolderItem::DrawItem(GvTreeView* view, BPoint where, int mode)
 	if (mode == 1) {
 		BPoint corner = view->PenLocation();
 		view->PushState();
-		view->SetLowColor(kHighlight);
+		view->SetLowColor(GV_WASH);
 		view->SetDrawingMode(B_OP_COPY);
 		view->FillRect(BRect(corner, corner + BPoint(textWidth + GV_TREE_ICON, GV_TREE_V_INT)),
 			B_SOLID_LOW);
@@ -133,7 +133,7 @@ void GvTreeView::Disable(BRect area)
 	if (enabled) {
 		PushState();
 		SetDrawingMode(B_OP_MAX);
-		SetHighColor(kHighlight);
+		SetHighColor(GV_WASH);
 		FillRect(area);
 		PopState();
 		if (Window() != NULL)
