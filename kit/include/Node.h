@@ -103,12 +103,16 @@ protected:
 	status_t _GetPath(std::string* path) const;
 	// The kit's id of the node's volume.
 	dev_t _Device() const;
+	// The open node's state, or NULL when unset.
+	const std::shared_ptr<BPrivate::NodeData>& _Data() const { return fData; }
 
 private:
 	virtual status_t _SetStat(const struct stat& st, uint32 what);
-	status_t _Adopt(int fd);
+	status_t _Adopt(int fd, int openFlags);
 
-	std::unique_ptr<BPrivate::NodeData> fData;
+	// Shared with the folder registry while a folder is open, so that the
+	// refs of its entries open through it.
+	std::shared_ptr<BPrivate::NodeData> fData;
 	status_t fCStatus;
 };
 

@@ -50,10 +50,15 @@ public:
 	status_t Find(dev_t device, VolumeEntry* volume);
 	status_t Boot(VolumeEntry* volume);
 	// The id of the volume whose root is the deepest ancestor of an
-	// absolute path without links (the path itself included).
-	dev_t DeviceFor(const std::string& canonicalPath);
+	// absolute path without links (the path itself included), and whether
+	// the path is that root when isRoot is not NULL.
+	dev_t DeviceFor(const std::string& canonicalPath, bool* isRoot = nullptr);
 	// Whether an absolute path without links is the root of a volume.
 	bool IsRoot(const std::string& canonicalPath, dev_t* device = nullptr);
+	// Whether a volume's root has leaf as its last name, in the table as it
+	// was last read: a quick way for a caller who has just used the table
+	// to rule out that an entry is a root, without its path.
+	bool MayBeRootNamed(const char* leaf);
 
 	// Mount and unmount events go to messenger until RemoveWatcher.
 	int32 AddWatcher(const BMessenger& messenger);

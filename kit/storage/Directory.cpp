@@ -14,34 +14,64 @@
 #include "DirectoryRegistry.h"
 #include "EntryPath.h"
 #include "ErrnoStatus.h"
+#include "NodeData.h"
 #include "VolumeTable.h"
 
 using BPrivate::StatusFromErrno;
 
 namespace BPrivate {
 
-// A walk through a folder's entries on a descriptor of its own.
+// A walk through a folder's entries: reads the folder's descriptor itself,
+// which nothing else reads or seeks, so a walk costs no descriptor of its own.
 struct DirectoryIterator {
-	explicit DirectoryIterator(DIR* dir) : dir(dir) {}
+	DirectoryIterator(int fd, bool ownsDescriptor)
+		: fd(fd), ownsDescriptor(ownsDescriptor),
+		  buffer(std::make_unique<char[]>(kBufferSize)) {}
 	DirectoryIterator(const DirectoryIterator&) = delete;
 	DirectoryIterator& operator=(const DirectoryIterator&) = delete;
-	~DirectoryIterator() { closedir(dir); }
+	~DirectoryIterator()
+	{
+		if (ownsDescriptor)
+			close(fd);
+	}
 
-	// The next entry but "." and "..", or NULL at the end.
+	// The next entry but "." and "..", or NULL at the end (errno 0) or on
+	// an error (errno set).
 	const char* Next()
 	{
 		while (true) {
-			errno = 0;
-			dirent* entry = readdir(dir);
-			if (entry == nullptr)
-				return nullptr;
+			if (offset >= filled) {
+				ssize_t length = getdents64(fd, buffer.get(), kBufferSize);
+				if (length <= 0) {
+					if (length == 0)
+						errno = 0;
+					return nullptr;
+				}
+				filled = length;
+				offset = 0;
+			}
+			auto* entry = reinterpret_cast<dirent64*>(buffer.get() + offset);
+			offset += entry->d_reclen;
 			if (std::strcmp(entry->d_name, ".") != 0
 				&& std::strcmp(entry->d_name, "..") != 0)
 				return entry->d_name;
 		}
 	}
 
-	DIR* dir;
+	status_t Rewind()
+	{
+		if (lseek(fd, 0, SEEK_SET) < 0)
+			return StatusFromErrno();
+		offset = filled = 0;
+		return B_OK;
+	}
+
+	static constexpr size_t kBufferSize = 32768;
+	int fd;
+	bool ownsDescriptor;
+	std::unique_ptr<char[]> buffer;
+	size_t offset = 0;
+	size_t filled = 0;
 	ino_t node = 0;
 };
 
@@ -51,18 +81,13 @@ using BPrivate::DirectoryIterator;
 
 namespace {
 
-// A new walk of the folder open as fd.
+// A new walk of the folder open as fd, on a descriptor of its own.
 std::unique_ptr<DirectoryIterator> OpenIterator(int fd)
 {
 	int own = openat(fd, ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
 	if (own < 0)
 		return nullptr;
-	DIR* dir = fdopendir(own);
-	if (dir == nullptr) {
-		close(own);
-		return nullptr;
-	}
-	return std::make_unique<DirectoryIterator>(dir);
+	return std::make_unique<DirectoryIterator>(own, true);
 }
 
 status_t CheckChildPath(const BDirectory& dir, const char* path)
@@ -124,7 +149,8 @@ BDirectory::~BDirectory() = default;
 status_t BDirectory::SetTo(const entry_ref* ref)
 {
 	fIterator.reset();
-	return _Open(_SetToRef(ref, O_RDONLY | O_DIRECTORY));
+	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
+	return _Open(_SetToRef(ref, O_RDONLY | O_DIRECTORY), moves);
 }
 
 status_t BDirectory::SetTo(const node_ref* nref)
@@ -143,19 +169,22 @@ status_t BDirectory::SetTo(const node_ref* nref)
 status_t BDirectory::SetTo(const BEntry* entry)
 {
 	fIterator.reset();
-	return _Open(_SetToEntry(entry, O_RDONLY | O_DIRECTORY));
+	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
+	return _Open(_SetToEntry(entry, O_RDONLY | O_DIRECTORY), moves);
 }
 
 status_t BDirectory::SetTo(const char* path)
 {
 	fIterator.reset();
-	return _Open(_SetToPath(path, O_RDONLY | O_DIRECTORY));
+	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
+	return _Open(_SetToPath(path, O_RDONLY | O_DIRECTORY), moves);
 }
 
 status_t BDirectory::SetTo(const BDirectory* dir, const char* path)
 {
 	fIterator.reset();
-	return _Open(_SetToAt(dir, path, O_RDONLY | O_DIRECTORY));
+	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
+	return _Open(_SetToAt(dir, path, O_RDONLY | O_DIRECTORY), moves);
 }
 
 void BDirectory::Unset()
@@ -165,29 +194,32 @@ void BDirectory::Unset()
 }
 
 // Starts the walk of the folder just opened (when status says it was) and
-// registers the folder, so that the refs of its entries resolve.
-status_t BDirectory::_Open(status_t status)
+// registers the folder, so that the refs of its entries resolve. movesBefore
+// is the registry's count of moves taken before the opening.
+status_t BDirectory::_Open(status_t status, uint64 movesBefore)
 {
 	if (status != B_OK)
 		return status;
-	struct stat st;
-	if (fstat(_FileDescriptor(), &st) != 0)
-		return _Fail(StatusFromErrno());
-	fIterator = OpenIterator(_FileDescriptor());
-	if (fIterator == nullptr)
-		return _Fail(StatusFromErrno());
-	fIterator->node = st.st_ino;
+	const BPrivate::NodeData& data = *_Data();
+	if (!data.opened)
+		return _Fail(B_ENTRY_NOT_FOUND);
 
 	BPrivate::DirectoryRegistry& registry
 		= BPrivate::DirectoryRegistry::Default();
 	std::shared_lock<std::shared_mutex> noMoves(registry.MoveLock());
-	std::string path;
-	status = _GetPath(&path);
-	if (status != B_OK) {
-		fIterator.reset();
-		return _Fail(status);
+	// A move by the kit since the opening may have changed the path.
+	std::string movedTo;
+	const std::string* path = &data.openedPath;
+	if (registry.Moves() != movesBefore) {
+		status = _GetPath(&movedTo);
+		if (status != B_OK)
+			return _Fail(status);
+		path = &movedTo;
 	}
-	registry.Register(_Device(), st.st_ino, st.st_dev, path);
+	registry.Register(_Device(), data.openedStat.st_ino,
+		data.openedStat.st_dev, *path, _Data());
+	fIterator = std::make_unique<DirectoryIterator>(data.fd, false);
+	fIterator->node = data.openedStat.st_ino;
 	return B_OK;
 }
 
@@ -222,11 +254,11 @@ status_t BDirectory::GetEntry(BEntry* entry) const
 	return entry->SetTo(path.c_str());
 }
 
+// Told at the opening: the folder open here stays what it was even when
+// another volume is mounted over its path later.
 bool BDirectory::IsRootDirectory() const
 {
-	std::string path;
-	return _GetPath(&path) == B_OK
-		&& BPrivate::VolumeTable::Default().IsRoot(path);
+	return InitCheck() == B_OK && _Data()->isRoot;
 }
 
 status_t BDirectory::FindEntry(const char* path, BEntry* entry,
@@ -276,9 +308,11 @@ status_t BDirectory::GetStatFor(const char* path, struct stat* st) const
 		return B_BAD_VALUE;
 	if (fstatat(_FileDescriptor(), path, st, AT_SYMLINK_NOFOLLOW) != 0)
 		return StatusFromErrno();
-	// Only a folder can be the root of another volume.
+	// Only a folder can be the root of another volume, and only a folder
+	// named as the root of one.
 	bool name = BPrivate::CheckName(path) == B_OK;
-	if (name && !S_ISDIR(st->st_mode)) {
+	if (name && (!S_ISDIR(st->st_mode)
+			|| !BPrivate::VolumeTable::Default().MayBeRootNamed(path))) {
 		st->st_dev = _Device();
 		return B_OK;
 	}
@@ -330,8 +364,7 @@ status_t BDirectory::Rewind()
 {
 	if (InitCheck() != B_OK)
 		return InitCheck();
-	rewinddir(fIterator->dir);
-	return B_OK;
+	return fIterator->Rewind();
 }
 
 int32 BDirectory::CountEntries() const
@@ -386,9 +419,10 @@ BDirectory& BDirectory::operator=(const BDirectory& dir)
 {
 	if (this != &dir) {
 		fIterator.reset();
+		uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
 		BNode::operator=(dir);
 		if (InitCheck() == B_OK)
-			_Open(B_OK);
+			_Open(B_OK, moves);
 	}
 	return *this;
 }

@@ -2,6 +2,7 @@
 
 #include <sys/stat.h>
 
+#include "NodeData.h"
 #include "VolumeTable.h"
 
 namespace BPrivate {
@@ -30,10 +31,22 @@ DirectoryRegistry& DirectoryRegistry::Default()
 }
 
 void DirectoryRegistry::Register(dev_t device, ino_t node, dev_t systemDevice,
-	const std::string& path)
+	const std::string& path, const std::shared_ptr<NodeData>& open)
 {
 	std::lock_guard<std::mutex> locker(fLock);
-	fFolders[{ device, node }] = { path, systemDevice };
+	Location& location = fFolders[{ device, node }];
+	location.path = path;
+	location.systemDevice = systemDevice;
+	if (open != nullptr)
+		location.open = open;
+}
+
+std::shared_ptr<NodeData> DirectoryRegistry::OpenFolder(dev_t device,
+	ino_t node)
+{
+	std::lock_guard<std::mutex> locker(fLock);
+	auto found = fFolders.find({ device, node });
+	return found != fFolders.end() ? found->second.open.lock() : nullptr;
 }
 
 status_t DirectoryRegistry::Resolve(dev_t device, ino_t node,
@@ -55,6 +68,14 @@ status_t DirectoryRegistry::Resolve(dev_t device, ino_t node,
 			*path = location.path;
 			return B_OK;
 		}
+		// A folder open right now is found wherever another program put it.
+		std::shared_ptr<NodeData> open = location.open.lock();
+		std::string now;
+		if (open != nullptr && PathOfDescriptor(open->fd, &now) == B_OK) {
+			Register(device, node, location.systemDevice, now);
+			*path = now;
+			return B_OK;
+		}
 		std::lock_guard<std::mutex> locker(fLock);
 		auto found = fFolders.find({ device, node });
 		if (found != fFolders.end() && found->second.path == location.path)
@@ -74,6 +95,7 @@ status_t DirectoryRegistry::Resolve(dev_t device, ino_t node,
 
 void DirectoryRegistry::Moved(const std::string& from, const std::string& to)
 {
+	fMoves++;
 	std::lock_guard<std::mutex> locker(fLock);
 	for (auto& [key, location] : fFolders) {
 		if (IsAtOrBelow(location.path, from))

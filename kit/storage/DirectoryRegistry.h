@@ -1,7 +1,9 @@
 #ifndef KIT_STORAGE_DIRECTORY_REGISTRY_H
 #define KIT_STORAGE_DIRECTORY_REGISTRY_H
 
+#include <atomic>
 #include <map>
+#include <memory>
 #include <mutex>
 #include <shared_mutex>
 #include <string>
@@ -9,6 +11,8 @@
 #include <SupportDefs.h>
 
 namespace BPrivate {
+
+struct NodeData;
 
 // Where the folders the kit has seen lie, by (volume id, node), so that an
 // entry_ref can be turned back into a path. A path is checked with lstat
@@ -24,12 +28,21 @@ public:
 	// left behind.
 	std::shared_mutex& MoveLock() { return fMoveLock; }
 
-	// systemDevice is the folder's own st_dev, checked on use.
+	// systemDevice is the folder's own st_dev, checked on use. A folder
+	// registered by a BDirectory open on it also keeps that BDirectory's node
+	// (not owning it) until another opens it; a registration without a node
+	// keeps the one known.
 	void Register(dev_t device, ino_t node, dev_t systemDevice,
-		const std::string& path);
+		const std::string& path,
+		const std::shared_ptr<NodeData>& open = nullptr);
 	// B_ENTRY_NOT_FOUND when the folder is unknown or no longer there.
 	// Takes the move lock itself.
 	status_t Resolve(dev_t device, ino_t node, std::string* path);
+	// How many moves of folders the kit has made: a path found before a
+	// change of the count may be one a move left behind.
+	uint64 Moves() const { return fMoves.load(); }
+	// The node of a BDirectory open on the folder right now, or NULL.
+	std::shared_ptr<NodeData> OpenFolder(dev_t device, ino_t node);
 	// A folder (and so everything below it) now lies at to.
 	void Moved(const std::string& from, const std::string& to);
 	void Removed(const std::string& path);
@@ -38,9 +51,11 @@ private:
 	struct Location {
 		std::string path;
 		dev_t systemDevice;
+		std::weak_ptr<NodeData> open;
 	};
 
 	std::shared_mutex fMoveLock;
+	std::atomic<uint64> fMoves = 0;
 	std::mutex fLock;
 	std::map<std::pair<dev_t, ino_t>, Location> fFolders;
 };

@@ -160,16 +160,19 @@ status_t RefForPath(const char* path, bool traverse, entry_ref* ref)
 	return ref->set_name(entry.leaf.c_str());
 }
 
-status_t EntryForRef(const entry_ref& ref, EntryPath* entry)
+status_t CheckRefName(const entry_ref& ref)
 {
 	if (ref.name == nullptr)
 		return B_BAD_VALUE;
-	if (std::strcmp(ref.name, ".") != 0) {
-		status_t status = CheckName(ref.name);
-		if (status != B_OK)
-			return status;
-	}
-	status_t status = DirectoryRegistry::Default().Resolve(ref.device,
+	return std::strcmp(ref.name, ".") == 0 ? B_OK : CheckName(ref.name);
+}
+
+status_t EntryForRef(const entry_ref& ref, EntryPath* entry)
+{
+	status_t status = CheckRefName(ref);
+	if (status != B_OK)
+		return status;
+	status = DirectoryRegistry::Default().Resolve(ref.device,
 		ref.directory, &entry->folder);
 	if (status != B_OK)
 		return status;

@@ -32,6 +32,9 @@ status_t CanonicalPath(const char* path, std::string* canonical);
 status_t RefForPath(const char* path, bool traverse, entry_ref* ref);
 // The entry a ref names.
 status_t EntryForRef(const entry_ref& ref, EntryPath* entry);
+// Whether a ref's name can name an entry of its folder: a name (see
+// CheckName) or "." for the folder itself.
+status_t CheckRefName(const entry_ref& ref);
 
 // Where the folder a BDirectory is open on lies now.
 status_t PathOfDirectory(const BDirectory* dir, std::string* path);

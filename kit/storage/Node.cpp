@@ -12,6 +12,7 @@
 #include <Entry.h>
 
 #include "Attributes.h"
+#include "DirectoryRegistry.h"
 #include "EntryPath.h"
 #include "ErrnoStatus.h"
 #include "NodeData.h"
@@ -25,7 +26,7 @@ NodeData::~NodeData()
 		close(fd);
 }
 
-status_t PathOfDescriptor(int fd, std::string* path)
+status_t PathOfDescriptor(int fd, std::string* path, struct stat* st)
 {
 	std::string link = "/proc/self/fd/" + std::to_string(fd);
 	char buffer[PATH_MAX];
@@ -36,9 +37,11 @@ status_t PathOfDescriptor(int fd, std::string* path)
 		return B_NAME_TOO_LONG;
 	path->assign(buffer, length);
 	// A removed node reads as "PATH (deleted)"; it has no links left.
-	struct stat st;
-	if (path->empty() || (*path)[0] != '/' || fstat(fd, &st) != 0
-		|| st.st_nlink == 0) {
+	struct stat own;
+	if (st == nullptr)
+		st = &own;
+	if (path->empty() || (*path)[0] != '/' || fstat(fd, st) != 0
+		|| st->st_nlink == 0) {
 		return B_ENTRY_NOT_FOUND;
 	}
 	return B_OK;
@@ -145,8 +148,18 @@ status_t BNode::_SetToRef(const entry_ref* ref, int openFlags)
 	Unset();
 	if (ref == nullptr)
 		return fCStatus = B_BAD_VALUE;
+	status_t status = BPrivate::CheckRefName(*ref);
+	if (status != B_OK)
+		return fCStatus = status;
+	// A folder open right now reaches its entries wherever it lies.
+	std::shared_ptr<NodeData> folder = BPrivate::DirectoryRegistry::Default()
+		.OpenFolder(ref->device, ref->directory);
+	if (folder != nullptr) {
+		return _Adopt(openat(folder->fd, ref->name,
+			openFlags | O_CLOEXEC | O_NOCTTY | O_NONBLOCK, 0666), openFlags);
+	}
 	BPrivate::EntryPath entry;
-	status_t status = BPrivate::EntryForRef(*ref, &entry);
+	status = BPrivate::EntryForRef(*ref, &entry);
 	if (status != B_OK)
 		return fCStatus = status;
 	return _SetToPath(entry.Path().c_str(), openFlags);
@@ -170,7 +183,7 @@ status_t BNode::_SetToPath(const char* path, int openFlags)
 	if (path == nullptr || path[0] == '\0')
 		return fCStatus = B_BAD_VALUE;
 	return _Adopt(open(path, openFlags | O_CLOEXEC | O_NOCTTY | O_NONBLOCK,
-		0666));
+		0666), openFlags);
 }
 
 status_t BNode::_SetToAt(const BDirectory* dir, const char* path,
@@ -188,21 +201,27 @@ status_t BNode::_SetToAt(const BDirectory* dir, const char* path,
 	if (fd < 0)
 		return _Fail(BPrivate::StatusFromErrno());
 	Unset();
-	return _Adopt(fd);
+	return _Adopt(fd, openFlags);
 }
 
-// Takes fd, just opened (or the open's failure), as this node.
-status_t BNode::_Adopt(int fd)
+// Takes fd, just opened with openFlags (or the open's failure), as this
+// node.
+status_t BNode::_Adopt(int fd, int openFlags)
 {
 	if (fd < 0)
 		return fCStatus = BPrivate::StatusFromErrno();
-	auto data = std::make_unique<NodeData>();
+	// Not made with make_shared: the registry's weak pointers would keep the
+	// whole node's memory.
+	std::shared_ptr<NodeData> data(new NodeData);
 	data->fd = fd;
-	data->pathOnly = (fcntl(fd, F_GETFL) & O_PATH) != 0;
+	data->pathOnly = (openFlags & O_PATH) != 0;
 	// A node removed right after its opening has no volume to tell.
-	std::string canonical;
-	if (BPrivate::PathOfDescriptor(fd, &canonical) == B_OK)
-		data->device = BPrivate::VolumeTable::Default().DeviceFor(canonical);
+	data->opened = BPrivate::PathOfDescriptor(fd, &data->openedPath,
+		&data->openedStat) == B_OK;
+	if (data->opened) {
+		data->device = BPrivate::VolumeTable::Default().DeviceFor(
+			data->openedPath, &data->isRoot);
+	}
 	fData = std::move(data);
 	return fCStatus = B_OK;
 }
@@ -344,7 +363,7 @@ BNode& BNode::operator=(const BNode& node)
 	int flags = fcntl(fd, F_GETFL)
 		& (O_ACCMODE | O_APPEND | O_NONBLOCK | O_PATH);
 	std::string link = "/proc/self/fd/" + std::to_string(fd);
-	_Adopt(open(link.c_str(), flags | O_CLOEXEC | O_NOCTTY));
+	_Adopt(open(link.c_str(), flags | O_CLOEXEC | O_NOCTTY), flags);
 	return *this;
 }
 

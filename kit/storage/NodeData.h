@@ -2,6 +2,7 @@
 #define KIT_STORAGE_NODE_DATA_H
 
 #include <string>
+#include <sys/stat.h>
 #include <vector>
 
 #include <SupportDefs.h>
@@ -21,6 +22,14 @@ struct NodeData {
 	dev_t device = 0;
 	bool locked = false;
 
+	// Where the node was and what it was when it was opened, read once so
+	// that a folder opened for a walk needs no second look; opened is false
+	// when the node was removed before it could be located.
+	bool opened = false;
+	std::string openedPath;
+	struct stat openedStat = {};
+	bool isRoot = false;
+
 	// The names GetNextAttrName walks through, read at its first call.
 	std::vector<std::string> attributeNames;
 	size_t nextAttribute = 0;
@@ -28,8 +37,9 @@ struct NodeData {
 };
 
 // The current path of an open descriptor, as the kernel knows it;
-// B_ENTRY_NOT_FOUND once the node has been removed.
-status_t PathOfDescriptor(int fd, std::string* path);
+// B_ENTRY_NOT_FOUND once the node has been removed. Gives the node's stat
+// as well when st is not NULL.
+status_t PathOfDescriptor(int fd, std::string* path, struct stat* st = nullptr);
 
 }
 

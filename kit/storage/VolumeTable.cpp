@@ -6,6 +6,7 @@
 #include <climits>
 #include <fcntl.h>
 #include <cstdlib>
+#include <cstring>
 #include <map>
 #include <mutex>
 #include <poll.h>
@@ -380,10 +381,17 @@ status_t VolumeTable::Boot(VolumeEntry* volume)
 	return B_OK;
 }
 
-dev_t VolumeTable::DeviceFor(const std::string& canonicalPath)
+dev_t VolumeTable::DeviceFor(const std::string& canonicalPath, bool* isRoot)
 {
 	fPrivate->CheckFresh();
 	std::lock_guard<std::mutex> locker(fPrivate->lock);
+	if (isRoot != nullptr) {
+		const std::vector<VolumeEntry>& volumes = fPrivate->snapshot.volumes;
+		*isRoot = std::any_of(volumes.begin(), volumes.end(),
+			[&](const VolumeEntry& volume) {
+				return volume.root == canonicalPath;
+			});
+	}
 	const MountPoint* deepest = nullptr;
 	for (const MountPoint& mount : fPrivate->snapshot.mountPoints) {
 		if (IsAncestorOrSelf(mount.path, canonicalPath)
@@ -411,6 +419,20 @@ bool VolumeTable::IsRoot(const std::string& canonicalPath, dev_t* device)
 				*device = volume.device;
 			return true;
 		}
+	}
+	return false;
+}
+
+bool VolumeTable::MayBeRootNamed(const char* leaf)
+{
+	size_t length = std::strlen(leaf);
+	std::lock_guard<std::mutex> locker(fPrivate->lock);
+	for (const VolumeEntry& volume : fPrivate->snapshot.volumes) {
+		const std::string& root = volume.root;
+		if (root.size() > length
+			&& root.compare(root.size() - length, length, leaf) == 0
+			&& root[root.size() - length - 1] == '/')
+			return true;
 	}
 	return false;
 }

@@ -51,6 +51,24 @@ TEST(EntryTest, RefsFollowFoldersTheKitRenamesAndMoves)
 	ASSERT_EQ(0, rename((scratch / "elsewhere/renamed").c_str(),
 		(scratch / "outside").c_str()));
 	EXPECT_EQ(B_ENTRY_NOT_FOUND, BEntry(&inner).InitCheck());
+
+	// While its folder is open, a ref follows it wherever it goes, and a
+	// name that would leave the folder is still refused.
+	{
+		BDirectory open((scratch / "outside/b").c_str());
+		ASSERT_EQ(0, rename((scratch / "outside").c_str(),
+			(scratch / "again").c_str()));
+		EXPECT_EQ(B_OK, BFile(&inner, B_READ_ONLY).InitCheck());
+		EXPECT_EQ(scratch / "again/b/note", PathOf(inner));
+		entry_ref up(inner.device, inner.directory, "../b");
+		EXPECT_EQ(B_BAD_VALUE, BFile(&up, B_READ_ONLY).InitCheck());
+		up.set_name("..");
+		EXPECT_EQ(B_BAD_VALUE, BNode(&up).InitCheck());
+	}
+	ASSERT_EQ(0, rename((scratch / "again").c_str(),
+		(scratch / "outside").c_str()));
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, BFile(&inner, B_READ_ONLY).InitCheck());
+	EXPECT_EQ(B_ENTRY_NOT_FOUND, BEntry(&inner).InitCheck());
 }
 
 TEST(EntryTest, RefsCompareAcrossWaysOfGettingThem)
