@@ -59,7 +59,7 @@ public:
 	BDirectory& operator=(const BDirectory& dir);
 
 private:
-	status_t _Open(status_t status, uint64 movesBefore);
+	status_t _Open(status_t status);
 	status_t _Absolute(const char* path, std::string* absolute) const;
 
 	std::unique_ptr<BPrivate::DirectoryIterator> fIterator;

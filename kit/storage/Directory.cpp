@@ -149,8 +149,7 @@ BDirectory::~BDirectory() = default;
 status_t BDirectory::SetTo(const entry_ref* ref)
 {
 	fIterator.reset();
-	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
-	return _Open(_SetToRef(ref, O_RDONLY | O_DIRECTORY), moves);
+	return _Open(_SetToRef(ref, O_RDONLY | O_DIRECTORY));
 }
 
 status_t BDirectory::SetTo(const node_ref* nref)
@@ -169,22 +168,19 @@ status_t BDirectory::SetTo(const node_ref* nref)
 status_t BDirectory::SetTo(const BEntry* entry)
 {
 	fIterator.reset();
-	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
-	return _Open(_SetToEntry(entry, O_RDONLY | O_DIRECTORY), moves);
+	return _Open(_SetToEntry(entry, O_RDONLY | O_DIRECTORY));
 }
 
 status_t BDirectory::SetTo(const char* path)
 {
 	fIterator.reset();
-	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
-	return _Open(_SetToPath(path, O_RDONLY | O_DIRECTORY), moves);
+	return _Open(_SetToPath(path, O_RDONLY | O_DIRECTORY));
 }
 
 status_t BDirectory::SetTo(const BDirectory* dir, const char* path)
 {
 	fIterator.reset();
-	uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
-	return _Open(_SetToAt(dir, path, O_RDONLY | O_DIRECTORY), moves);
+	return _Open(_SetToAt(dir, path, O_RDONLY | O_DIRECTORY));
 }
 
 void BDirectory::Unset()
@@ -194,9 +190,8 @@ void BDirectory::Unset()
 }
 
 // Starts the walk of the folder just opened (when status says it was) and
-// registers the folder, so that the refs of its entries resolve. movesBefore
-// is the registry's count of moves taken before the opening.
-status_t BDirectory::_Open(status_t status, uint64 movesBefore)
+// registers the folder, so that the refs of its entries resolve.
+status_t BDirectory::_Open(status_t status)
 {
 	if (status != B_OK)
 		return status;
@@ -207,10 +202,10 @@ status_t BDirectory::_Open(status_t status, uint64 movesBefore)
 	BPrivate::DirectoryRegistry& registry
 		= BPrivate::DirectoryRegistry::Default();
 	std::shared_lock<std::shared_mutex> noMoves(registry.MoveLock());
-	// A move by the kit since the opening may have changed the path.
+	// A move by the kit since the path was read may have changed it.
 	std::string movedTo;
 	const std::string* path = &data.openedPath;
-	if (registry.Moves() != movesBefore) {
+	if (registry.Moves() != data.movesBeforeLocating) {
 		status = _GetPath(&movedTo);
 		if (status != B_OK)
 			return _Fail(status);
@@ -419,10 +414,9 @@ BDirectory& BDirectory::operator=(const BDirectory& dir)
 {
 	if (this != &dir) {
 		fIterator.reset();
-		uint64 moves = BPrivate::DirectoryRegistry::Default().Moves();
 		BNode::operator=(dir);
 		if (InitCheck() == B_OK)
-			_Open(B_OK, moves);
+			_Open(B_OK);
 	}
 	return *this;
 }

@@ -215,6 +215,7 @@ status_t BNode::_Adopt(int fd, int openFlags)
 	std::shared_ptr<NodeData> data(new NodeData);
 	data->fd = fd;
 	data->pathOnly = (openFlags & O_PATH) != 0;
+	data->movesBeforeLocating = BPrivate::DirectoryRegistry::Default().Moves();
 	// A node removed right after its opening has no volume to tell.
 	data->opened = BPrivate::PathOfDescriptor(fd, &data->openedPath,
 		&data->openedStat) == B_OK;

@@ -26,6 +26,8 @@ struct NodeData {
 	// that a folder opened for a walk needs no second look; opened is false
 	// when the node was removed before it could be located.
 	bool opened = false;
+	// The registry's count of moves just before openedPath was read.
+	uint64 movesBeforeLocating = 0;
 	std::string openedPath;
 	struct stat openedStat = {};
 	bool isRoot = false;

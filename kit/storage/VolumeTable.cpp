@@ -68,6 +68,15 @@ bool IsAncestorOrSelf(const std::string& root, const std::string& path)
 		&& (path.size() == root.size() || path[root.size()] == '/');
 }
 
+// The volume whose root is canonicalPath, or NULL.
+const VolumeEntry* RootAt(const std::vector<VolumeEntry>& volumes,
+	const std::string& canonicalPath)
+{
+	auto found = std::find_if(volumes.begin(), volumes.end(),
+		[&](const VolumeEntry& volume) { return volume.root == canonicalPath; });
+	return found != volumes.end() ? &*found : nullptr;
+}
+
 bool SameVolume(const VolumeEntry& a, const VolumeEntry& b)
 {
 	return a.device == b.device && a.root == b.root;
@@ -385,13 +394,8 @@ dev_t VolumeTable::DeviceFor(const std::string& canonicalPath, bool* isRoot)
 {
 	fPrivate->CheckFresh();
 	std::lock_guard<std::mutex> locker(fPrivate->lock);
-	if (isRoot != nullptr) {
-		const std::vector<VolumeEntry>& volumes = fPrivate->snapshot.volumes;
-		*isRoot = std::any_of(volumes.begin(), volumes.end(),
-			[&](const VolumeEntry& volume) {
-				return volume.root == canonicalPath;
-			});
-	}
+	if (isRoot != nullptr)
+		*isRoot = RootAt(fPrivate->snapshot.volumes, canonicalPath) != nullptr;
 	const MountPoint* deepest = nullptr;
 	for (const MountPoint& mount : fPrivate->snapshot.mountPoints) {
 		if (IsAncestorOrSelf(mount.path, canonicalPath)
@@ -413,14 +417,10 @@ bool VolumeTable::IsRoot(const std::string& canonicalPath, dev_t* device)
 {
 	fPrivate->CheckFresh();
 	std::lock_guard<std::mutex> locker(fPrivate->lock);
-	for (const VolumeEntry& volume : fPrivate->snapshot.volumes) {
-		if (volume.root == canonicalPath) {
-			if (device != nullptr)
-				*device = volume.device;
-			return true;
-		}
-	}
-	return false;
+	const VolumeEntry* volume = RootAt(fPrivate->snapshot.volumes, canonicalPath);
+	if (volume != nullptr && device != nullptr)
+		*device = volume->device;
+	return volume != nullptr;
 }
 
 bool VolumeTable::MayBeRootNamed(const char* leaf)
